@@ -1,0 +1,218 @@
+// LD_JDF: the worker that processes one job, and the job model it holds.
+//
+// One worker serves one call of JDF_InitializeAndCreateNewJDF (or JDF_AutoImposition) on the
+// host's thread. Records are created with new and owned by one list each; the pipeline's last
+// step releases them, and the destructor releases whatever an early exit left behind.
+#pragma once
+
+#include <cstdint>
+#include <cwchar>
+#include <map>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "LD_Records.h"
+#include "XMLVersionRecords.h"
+#include "vorlan.h"
+#include "vorlan_export.h"
+
+namespace JDF {
+class KElement;
+class vElement;
+class JDFNode;
+class JDFLayout;
+class JDFRunList;
+class JDFMedia;
+}  // namespace JDF
+
+struct LD_JDFHandles;        // the parsed ticket's handles (parser, nodes, resources)
+struct ZippedJDFFileSystem;  // per-job file context and PDF session flag
+struct _kvXmlNode;           // node of the XML document tree
+
+class VORLAN_API LD_JDF {
+public:
+    LD_JDF();
+    LD_JDF(int (*progress)(float, void*), int (*filePath)(char*, int, void*), void* userData);
+    ~LD_JDF();
+    LD_JDF(const LD_JDF& other);
+    LD_JDF(LD_JDF&& other) noexcept;
+    LD_JDF& operator=(const LD_JDF& other);
+    LD_JDF& operator=(LD_JDF&& other) noexcept;
+
+    // ---- Job pipeline ----------------------------------------------------------------------
+    // Runs one job from the data file to the new ticket at outputJdfPath; every exit stores its
+    // code as the last error and returns it.
+    LDError JDF_InitializeAndCreateNewJDF(char* outputJdfPath, char* xmlBuffer, long xmlLength,
+                                          const char* dataFile, const char* jobFolder,
+                                          const char* pageRange, int jobNumber);
+    // Reads a ticket into the job model.
+    LDError JDF_InitializeAndParseJDF(wchar_t* path);
+    // Narrow overload: converts with the current locale and calls the wide one.
+    LDError JDF_InitializeAndParseJDF(const char* path);
+    LDError JDF_ValidateJDFForAPPE();                                // does nothing; 0
+    LDError createLayoutPerVersion(bool perVersion);                 // does nothing; 0
+    void JDF_Release(long long what);                                // does nothing
+    void JDF_ChangeSourceFileNameInJDF(wchar_t* from, wchar_t* to);  // does nothing
+    LDError JDF_GetLastErrorCode();
+    // Rewrites the ticket at jdfPath into an imposed layout from the settings file.
+    LDError JDF_AutoImposition(const char* settingsPath, const char* jdfPath);
+
+    // ---- Input resolution and path utilities ------------------------------------------------
+    InputDataFileTypes analizeDataFile(const char* path, wchar_t* out);
+    bool checkForPDF(wchar_t* path);
+    wchar_t* resolveDataFilePath(const char* path);
+    bool checkExtention(const char* fileName, char* extension);
+    char* extractFileNameFromPath(const char* path);
+    char* createNewTempDirFilePath(const char* fileName, const char* subFolder);
+    wchar_t* getNativeFilePath(wchar_t* path);
+    wchar_t* findFileByExtentionInDir(wchar_t* folder, wchar_t* extension);
+    wchar_t* findFileByNameInDir(wchar_t* folder, wchar_t* name);
+    void removePercentTwenty(wchar_t* text);
+    static char* getCharFromWChar(const wchar_t* text);
+    static wchar_t* getWCharFromChar(const char* text);
+    char* getHeapCopyOfConstCharPtr(const char* text);
+    void parseStringAttributeToStringVector(wchar_t* value, std::vector<wchar_t*>& list);
+    void parseRangeAttributeToIntVector(wchar_t* value, std::vector<long>& list);
+    bool isRange(wchar_t* token, long& first, long& last);
+    wchar_t* trimExtraSpaces(wchar_t* text);
+
+    // ---- Job attributes on the print server -------------------------------------------------
+    // Reads an attribute of this worker's job; *value stays valid until the next call.
+    bool getJobAttribute(const char* name, char** value);
+    bool setJobAttribute(const char* name, const char* value);
+
+    // ---- Version description ------------------------------------------------------------------
+    LDError parseXMLBuffer(const char* buffer, long length, bool hasTicket, const char* jobFolder);
+    LDError applyClientModeChangesToXMLBufferData();
+    bool IsEskoTechnicalVersion(_kvXmlNode* versions);
+    void removeNestedComponentsFromList(std::vector<wchar_t*>& list, std::vector<wchar_t*>& nested);
+    wchar_t* getAttributeValue(_kvXmlNode* node, const wchar_t* attributeName);
+
+    // ---- Automatic version description --------------------------------------------------------
+    bool populateKAVDieLibInks();
+    bool populateEskoTechInks();
+    bool generateImpInfoFile(const char* path);
+    bool parseImpInfoFile(const char* path, char** buffer, long* length);
+
+    // ---- Page ranges, expansion, die cuts, writer ---------------------------------------------
+    void applyPageRangeForLayout();
+    void applyPageRangeForPDF();
+    void applyPageRangeForPDFWithoutVersions();
+    LDError createRunListAndInterpretingParamPairs(bool jobHasTicket);
+    LDError addDieCut(bool jobHasTicket);
+    // Appends "key=value" to the job's die-info file in the job folder.
+    void AddDieInfoFile(const char* key, int32_t value);
+    LDError writeJDF(char* outputPath);
+
+    // ---- PDF work -------------------------------------------------------------------------------
+    LDError convertAllPDFs();
+    int32_t getFileIndexInZip(const char* name);
+
+    // ---- Queries ----------------------------------------------------------------------------------
+    std::vector<LD_PDF*>* JDF_GetAllContentPDFs();
+    std::vector<LD_PDF*>* JDF_GetAllMarkPDFs();
+    std::vector<LD_PDF*> JDF_GetContentPDFsByStatus(LD_Status status);
+    std::vector<LD_PDF*> JDF_GetMarkPDFsByStatus(LD_Status status);
+    LD_Status JDF_GetPDFStatus(wchar_t* name);
+    std::vector<LD_Run*>* JDF_GetAllContentRuns();
+    std::vector<LD_Run*>* JDF_GetAllMarkRuns();
+    std::vector<LD_OCG_InterpretingParams*>* JDF_GetAllInterpretingParams();
+    LD_OCG_RenderingParams* JDF_GetGlobalRenderingParams();
+    LD_OCG_Media* JDF_GetGlobalMediaSettings();
+    LD_OCG_Digital_Printing_Params* JDF_GetDigitalPrintingParams();
+    std::vector<LD_AuditData*>* JDF_GetAuditPool();
+    long JDF_GetMaxOrdinalNumber();
+    LD_ContentTableElement* JDF_GetLogicalContentPageByOrdinalNumber(long ordinal);
+    LD_MarkTableElement* JDF_GetLogicalMarkPageByOrdinalNumber(long ordinal);
+    long JDF_GetNumberOfLogicalDocs();
+    long JDF_GetNumberOfLogicalPages();
+    long JDF_GetNumberOfSurfaces();
+    long JDF_GetNumberOfSheets();
+    long JDF_GetNumberOfSignatures();
+    // Both throw std::out_of_range for an index outside the signature list.
+    LD_Signature* JDF_GetSignaturesInLayoutByIndex(long index);
+    LD_Range* JDF_GetRangeOfSheetsPerSignature(long index);
+
+    // ---- Record release (each owner list has one) ---------------------------------------------
+    void releaseLayout();
+    void releaseOrdinalTable();
+    void releasePDFs(std::vector<LD_PDF*>& pdfs);
+    void releaseRuns(std::vector<LD_Run*>& runs);
+    void releaseInterpretingParams();
+    void releaseVersions();
+    void releaseSurfaceVersions();
+    void releaseDieCuts();
+    void releaseLayerData();
+    void releaseAllRecords();  // everything any list still owns
+
+    // ---- Members ----------------------------------------------------------------------------------
+    int (*ProgressCallback)(float, void*) = nullptr;
+    int (*FilePathCallback)(char*, int, void*) = nullptr;
+    void* userData = nullptr;
+    InputDataFileTypes inputType = INPUT_UNKNOWN;
+    bool jobHasTicket = false;
+    wchar_t* jdfPath = nullptr;
+    char* jobFolder = nullptr;  // borrowed from the host
+    LD_PDF* inputPDF = nullptr;
+    ZippedJDFFileSystem* zipFileSystem = nullptr;
+    LD_JDFHandles* ticket = nullptr;  // parser, rootNode, processNode and the resource elements
+    std::vector<LD_AuditData*> auditPool;
+    int32_t numberOfLogicalPages = 0;
+    int32_t numberOfLogicalDocs = 1;
+    std::vector<LD_PDF*> contentPDFs;
+    std::vector<LD_PDF*> markPDFs;
+    std::vector<wchar_t*> layerNameList;
+    std::vector<wchar_t*> nestedComponentList;
+    int32_t placedObjectCount = 0;
+    int32_t contentObjectCount = 0;
+    int32_t markObjectCount = 0;
+    std::vector<LD_Signature*> signatures;
+    std::vector<LD_Sheet*> sheets;
+    std::vector<LD_Surface*> surfaces;
+    std::vector<LD_ContentObject*> contentObjects;
+    std::vector<LD_MarkObject*> markObjects;
+    int32_t numberOfSignatures = 0;
+    int32_t numberOfSheets = 0;
+    int32_t numberOfSurfaces = 0;
+    std::vector<LD_OrdinalTableElement*> m_OrdinalTable;
+    std::vector<LD_ContentObjectOrdinal> contentObjectOrdinalMap;
+    std::vector<LD_OCG_InterpretingParams*> m_InterpretingParams;
+    std::vector<LD_Run*> contentRuns;
+    std::vector<LD_Run*> markRuns;
+    LD_OCG_RenderingParams renderingParams;
+    LD_OCG_Media mediaSettings;
+    LD_OCG_Digital_Printing_Params digitalPrintingParams;
+    std::map<LD_PDF*, XMLLayerData*> layerDataMap;
+    std::vector<XMLVersionData*> versions;
+    std::vector<LD_DieCut*> m_XMLDieCuts;
+    LDError lastError = LD_OK;
+    uint64_t initializationTime = 0;
+    bool defaultLayerMode = false;
+    bool exportMode = false;
+    char* pageRange = nullptr;  // borrowed from the caller
+    int32_t pageRangeMode = 0;
+    std::vector<XMLSurfaceData*> surfaceVersions;
+    int32_t jobNumber = -1;
+    bool printDieLine = false;
+    std::map<LD_PDF*, std::vector<wchar_t*>> technicalInkMap;
+    std::map<LD_PDF*, std::vector<wchar_t*>> dieInkMap;
+    wchar_t* dataPath = nullptr;
+    bool eskoInksFound = false;
+    bool dieCutDefined = false;  // die-cut state flag
+    bool dieEnabled = false;
+    bool autoDieControl = false;
+    char* outputJdfPath = nullptr;  // borrowed from the caller
+    wchar_t* ticketDataPath = nullptr;
+    std::vector<bool> pageSelection;
+
+private:
+    void copyFrom(const LD_JDF& other);
+    void moveFrom(LD_JDF& other) noexcept;
+    void destroy() noexcept;
+    LDError exitWith(LDError code);
+    // Copies of one worker share their records; the last one destroyed releases them.
+    std::shared_ptr<int> recordShare_;
+    // The last job attribute read; getJobAttribute hands out a pointer into it.
+    std::string jobAttributeValue_;
+};

@@ -1,0 +1,61 @@
+/*
+ * vorlan: job preparation for print servers.
+ *
+ * The C entry points a print server's job host calls, once per job, on its own thread.
+ * Two jobs must not run at the same time in one process.
+ */
+#ifndef VORLAN_H
+#define VORLAN_H
+
+#include <stdbool.h>
+
+#include "vorlan_export.h"
+
+#ifdef __cplusplus
+extern "C" {
+#endif
+
+/* Result codes of every operation (LDError). Values 2, 5, 7 and 10 are never produced. */
+typedef enum LDError {
+    LD_OK = 0,                      /* success */
+    LD_FAILED = 1,                  /* general failure */
+    LD_QUERY_TARGET_ABSENT = 3,     /* a query named a PDF, node type or process that does not exist */
+    LD_JDF_UNUSABLE = 4,            /* the ticket cannot be used, or its layout is automated */
+    LD_JDF_RESOURCE_MISSING = 6,    /* a queried process node or resource is absent */
+    LD_FILE_NOT_FOUND = 8,          /* data file of no known kind, or a PDF is missing */
+    LD_REFERENCE_OUT_OF_RANGE = 9,  /* a pdfIndex or ordinal names nothing */
+    LD_PDF_CONVERSION_FAILED = 11,  /* converting a PDF for the versions failed */
+    LD_INVALID_INPUT = 12,          /* the data file is neither folder, compressed file nor PDF */
+    LD_JDF_WRITE_FAILED = 13        /* building or writing the new ticket failed */
+} LDError;
+
+/* Progress callback: stored with the worker, never called. */
+typedef int (*ProgressCallback)(float progress, void* userData);
+/* Asked for each new output file: the host writes a NUL-terminated path into buffer (size bytes). */
+typedef int (*FilePathCallback)(char* buffer, int size, void* userData);
+
+/*
+ * Runs one job: reads the version description at impinfoPath (job number from its file name
+ * "job<N>.impinfo"), classifies dataFile (job folder or bare PDF) and writes the new ticket to
+ * outputJdfPath. Returns an LDError, or -1 when the description buffer cannot be allocated.
+ */
+VORLAN_API int vorlan_consume_job(const char* dataFile, const char* impinfoPath, char* outputJdfPath,
+                                  const char* jobFolder, const char* pageRange, ProgressCallback progress,
+                                  FilePathCallback filePath, void* userData);
+
+/* True when path is a well-formed XML file whose root is OptionalContentGroupData (any case). */
+VORLAN_API bool vorlan_is_valid_job(const char* path);
+
+/* Rewrites the ticket at jdfPath into an imposed layout from the settings file. Returns 0 or 1. */
+VORLAN_API int vorlan_autoimp(const char* settingsPath, const char* jdfPath, ProgressCallback progress,
+                              FilePathCallback filePath);
+
+/* Scans the PDF's inks and writes a version description to outputPath. mode "True" matches the
+ * pages against the die library; any other text reads the Esko technical inks of the XMP. */
+VORLAN_API int vorlan_scan_xmp(const char* pdfPath, char* outputPath, const char* mode);
+
+#ifdef __cplusplus
+}
+#endif
+
+#endif /* VORLAN_H */

@@ -1,0 +1,155 @@
+#include "platform/os/text.h"
+
+#include <cerrno>
+#include <climits>
+#include <clocale>
+#include <cstdlib>
+#include <cstring>
+#include <cwctype>
+#include <langinfo.h>
+
+namespace vorlan::os {
+
+char* narrowCopy(const wchar_t* text) {
+    if (!text) return nullptr;
+    std::mbstate_t state{};
+    const wchar_t* probe = text;
+    size_t needed = std::wcsrtombs(nullptr, &probe, 0, &state);
+    if (needed == static_cast<size_t>(-1)) return nullptr;
+    char* out = static_cast<char*>(std::malloc(needed + 1));
+    if (!out) return nullptr;
+    state = std::mbstate_t{};
+    probe = text;
+    std::wcsrtombs(out, &probe, needed + 1, &state);
+    out[needed] = '\0';
+    return out;
+}
+
+wchar_t* wideCopy(const char* text) {
+    if (!text) return nullptr;
+    std::mbstate_t state{};
+    const char* probe = text;
+    size_t needed = std::mbsrtowcs(nullptr, &probe, 0, &state);
+    if (needed == static_cast<size_t>(-1)) return nullptr;
+    auto* out = static_cast<wchar_t*>(std::malloc((needed + 1) * sizeof(wchar_t)));
+    if (!out) return nullptr;
+    state = std::mbstate_t{};
+    probe = text;
+    std::mbsrtowcs(out, &probe, needed + 1, &state);
+    out[needed] = L'\0';
+    return out;
+}
+
+std::string narrow(const wchar_t* text) {
+    char* copy = narrowCopy(text);
+    if (!copy) return toUtf8(text ? std::wstring(text) : std::wstring());
+    std::string result(copy);
+    std::free(copy);
+    return result;
+}
+
+std::wstring widen(const char* text) {
+    wchar_t* copy = wideCopy(text);
+    if (!copy) return text ? fromUtf8(text) : std::wstring();
+    std::wstring result(copy);
+    std::free(copy);
+    return result;
+}
+
+std::string toUtf8(const wchar_t* text) { return text ? toUtf8(std::wstring(text)) : std::string(); }
+
+std::string toUtf8(const std::wstring& text) {
+    std::string out;
+    out.reserve(text.size());
+    for (wchar_t wc : text) {
+        auto cp = static_cast<uint32_t>(wc);
+        if (cp > 0x10FFFF || (cp >= 0xD800 && cp <= 0xDFFF)) cp = 0xFFFD;
+        if (cp < 0x80) {
+            out += static_cast<char>(cp);
+        } else if (cp < 0x800) {
+            out += static_cast<char>(0xC0 | (cp >> 6));
+            out += static_cast<char>(0x80 | (cp & 0x3F));
+        } else if (cp < 0x10000) {
+            out += static_cast<char>(0xE0 | (cp >> 12));
+            out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
+            out += static_cast<char>(0x80 | (cp & 0x3F));
+        } else {
+            out += static_cast<char>(0xF0 | (cp >> 18));
+            out += static_cast<char>(0x80 | ((cp >> 12) & 0x3F));
+            out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
+            out += static_cast<char>(0x80 | (cp & 0x3F));
+        }
+    }
+    return out;
+}
+
+std::wstring fromUtf8(const std::string& bytes) {
+    std::wstring out;
+    out.reserve(bytes.size());
+    size_t i = 0;
+    while (i < bytes.size()) {
+        auto lead = static_cast<unsigned char>(bytes[i]);
+        int extra = lead < 0x80 ? 0 : (lead >> 5) == 0x6 ? 1 : (lead >> 4) == 0xE ? 2 : (lead >> 3) == 0x1E ? 3 : -1;
+        if (extra < 0 || i + static_cast<size_t>(extra) >= bytes.size()) {
+            out += L'\uFFFD';
+            ++i;
+            continue;
+        }
+        uint32_t cp = extra == 0 ? lead : lead & (0x3F >> extra);
+        bool ok = true;
+        for (int k = 1; k <= extra; ++k) {
+            auto cont = static_cast<unsigned char>(bytes[i + k]);
+            if ((cont & 0xC0) != 0x80) {
+                ok = false;
+                break;
+            }
+            cp = (cp << 6) | (cont & 0x3F);
+        }
+        if (!ok) {
+            out += L'\uFFFD';
+            ++i;
+            continue;
+        }
+        out += static_cast<wchar_t>(cp);
+        i += static_cast<size_t>(extra) + 1;
+    }
+    return out;
+}
+
+int wtoi(const wchar_t* text) {
+    if (!text) return 0;
+    while (std::iswspace(static_cast<wint_t>(*text))) ++text;
+    bool negative = false;
+    if (*text == L'+' || *text == L'-') negative = (*text++ == L'-');
+    long long value = 0;
+    while (*text >= L'0' && *text <= L'9') {
+        if (value <= static_cast<long long>(INT_MAX) + 1) value = value * 10 + (*text - L'0');
+        ++text;
+    }
+    if (negative) value = -value;
+    if (value > INT_MAX) return INT_MAX;
+    if (value < INT_MIN) return INT_MIN;
+    return static_cast<int>(value);
+}
+
+bool equalsIgnoreCase(const wchar_t* a, const wchar_t* b) {
+    if (!a || !b) return a == b;
+    for (; *a && *b; ++a, ++b)
+        if (std::towlower(static_cast<wint_t>(*a)) != std::towlower(static_cast<wint_t>(*b))) return false;
+    return *a == *b;
+}
+
+bool equalsIgnoreCaseAscii(const char* a, const char* b) {
+    if (!a || !b) return a == b;
+    auto lower = [](unsigned char c) { return (c >= 'A' && c <= 'Z') ? c + 32 : c; };
+    for (; *a && *b; ++a, ++b)
+        if (lower(static_cast<unsigned char>(*a)) != lower(static_cast<unsigned char>(*b))) return false;
+    return *a == *b;
+}
+
+void ensureUtf8Locale() {
+    if (std::setlocale(LC_ALL, "") && std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0) return;
+    if (!std::setlocale(LC_ALL, "C.UTF-8")) std::setlocale(LC_ALL, "C");
+}
+
+}  // namespace vorlan::os

@@ -1,0 +1,47 @@
+// Helpers shared by the test suites.
+#pragma once
+
+#include <filesystem>
+#include <string>
+
+#include <gtest/gtest.h>
+
+namespace vorlan::test {
+
+// Folder holding the third-party corpus (jdf/, pdf/, jdf-schema/), or empty when it is absent.
+std::filesystem::path corpusDir();
+
+// A fresh folder under the system temporary folder, removed with the object.
+class TempDir {
+public:
+    TempDir();
+    ~TempDir();
+    TempDir(const TempDir&) = delete;
+    TempDir& operator=(const TempDir&) = delete;
+    const std::filesystem::path& path() const { return path_; }
+    std::filesystem::path operator/(const std::string& name) const { return path_ / name; }
+
+private:
+    std::filesystem::path path_;
+};
+
+// Writes bytes to a file, creating parent folders.
+void writeFile(const std::filesystem::path& file, const std::string& bytes);
+// Reads a whole file; empty when it cannot be read.
+std::string readFile(const std::filesystem::path& file);
+// Runs a shell command, returning its exit status; output goes to *output when given.
+int runCommand(const std::string& command, std::string* output = nullptr);
+// True when a program is on PATH.
+bool haveProgram(const std::string& name);
+// A minimal valid one-page PDF (optionally with a content stream) as bytes.
+std::string minimalPdf(const std::string& content = "0 0 m 10 10 l S");
+
+}  // namespace vorlan::test
+
+// Skips the current test with a clear message when the corpus is not present.
+#define VORLAN_REQUIRE_CORPUS()                                                              \
+    do {                                                                                     \
+        if (::vorlan::test::corpusDir().empty())                                             \
+            GTEST_SKIP() << "third-party corpus not found (set VORLAN_SHARED_DIR to the folder" \
+                            " holding corpus/); skipping";                                   \
+    } while (0)

@@ -1,0 +1,49 @@
+// vorlan valid, autoimpose and scan-xmp.
+#include <cstdio>
+#include <string>
+#include <vector>
+
+#include "commands.h"
+#include "vorlan/vorlan.h"
+
+namespace vorlan::cli {
+
+int runValid(Args args) {
+    if (wantsHelp(args) || args.size() != 1) {
+        std::fputs("usage: vorlan valid FILE\n\nPrints 'valid' when FILE is a well-formed version description\n"
+                   "(root element OptionalContentGroupData), else 'not valid'. Exit status 0 or 1.\n",
+                   args.size() == 1 ? stdout : stderr);
+        return wantsHelp(args) ? 0 : 2;
+    }
+    bool valid = vorlan_is_valid_job(args[0].c_str());
+    std::puts(valid ? "valid" : "not valid");
+    return valid ? 0 : 1;
+}
+
+int runAutoimpose(Args args) {
+    bool json = takeFlag(args, "--json");
+    if (wantsHelp(args) || args.size() != 2) {
+        std::fputs("usage: vorlan autoimpose [--json] SETTINGS_XML TICKET_JDF\n\n"
+                   "Rewrites TICKET_JDF in place into an imposed layout from the auto-impose settings.\n",
+                   wantsHelp(args) ? stdout : stderr);
+        return wantsHelp(args) ? 0 : 2;
+    }
+    return reportResult(vorlan_autoimp(args[0].c_str(), args[1].c_str(), nullptr, nullptr), json);
+}
+
+int runScanXmp(Args args) {
+    bool json = takeFlag(args, "--json");
+    bool dieLibrary = takeFlag(args, "--die-library");
+    if (wantsHelp(args) || args.size() != 2) {
+        std::fputs("usage: vorlan scan-xmp [--die-library] [--json] PDF OUTPUT_DESCRIPTION\n\n"
+                   "Writes a version description from the PDF's inks: by default from the Esko technical\n"
+                   "inks of its XMP ink list; with --die-library by matching its pages against the die library.\n",
+                   wantsHelp(args) ? stdout : stderr);
+        return wantsHelp(args) ? 0 : 2;
+    }
+    std::vector<char> output(args[1].begin(), args[1].end());
+    output.push_back('\0');
+    return reportResult(vorlan_scan_xmp(args[0].c_str(), output.data(), dieLibrary ? "True" : "False"), json);
+}
+
+}  // namespace vorlan::cli
