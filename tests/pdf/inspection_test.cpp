@@ -1,0 +1,177 @@
+// Page count and first-page size on generated files, and bad input of every kind.
+#include <gtest/gtest.h>
+
+#include <qpdf/QPDFObjectHandle.hh>
+
+#include "pdf/pdf_inspection.h"
+#include "pdf/pdf_session.h"
+#include "pdf/zipped_jdf_file_system.h"
+#include "test_pdf.h"
+#include "test_support.h"
+
+using vorlan::test::TempDir;
+using vorlan::test::TestPdf;
+
+namespace {
+
+struct Context {
+    ZippedJDFFileSystem* fs = createZippedJDFFileSystem("/nowhere/job");
+    ~Context() { destroyZippedJDFFileSystem(fs); }
+};
+
+std::pair<double, double> firstPageSize(const std::string& path) {
+    Context ctx;
+    double height = -1, width = -1;
+    getFirstPageSize(ctx.fs, path.c_str(), &height, &width);
+    return {height, width};
+}
+
+std::string onePage(const TempDir& dir, const TestPdf::PageOptions& options, const char* name = "p.pdf") {
+    TestPdf pdf;
+    pdf.addPage("0 0 m 1 1 l S", "<< >>", options);
+    std::string path = (dir / name).string();
+    pdf.write(path);
+    return path;
+}
+
+}  // namespace
+
+TEST(PdfInspection, CountsPagesAndStartsTheSessionOnce) {
+    TempDir dir;
+    TestPdf pdf;
+    for (int i = 0; i < 3; ++i) pdf.addPage("0 0 m 1 1 l S");
+    std::string path = (dir / "three.pdf").string();
+    pdf.write(path);
+    Context ctx;
+    EXPECT_FALSE(ctx.fs->pdfLibraryStarted);
+    EXPECT_EQ(getPDFPageCount(ctx.fs, path.c_str()), 3);
+    EXPECT_TRUE(ctx.fs->pdfLibraryStarted);
+    EXPECT_TRUE(pdfLibraryRunning());
+    destroyZippedJDFFileSystem(ctx.fs);
+    ctx.fs = nullptr;
+    EXPECT_FALSE(pdfLibraryRunning());
+}
+
+TEST(PdfInspection, FirstPageSizeFollowsRotationAndBoxes) {
+    TempDir dir;
+    TestPdf::PageOptions plain;
+    EXPECT_EQ(firstPageSize(onePage(dir, plain)), std::make_pair(100.0, 200.0));
+
+    TestPdf::PageOptions turned;
+    turned.rotate = 90;
+    EXPECT_EQ(firstPageSize(onePage(dir, turned, "r90.pdf")), std::make_pair(200.0, 100.0));
+    turned.rotate = -90;  // normalised to 270
+    EXPECT_EQ(firstPageSize(onePage(dir, turned, "rm90.pdf")), std::make_pair(200.0, 100.0));
+    turned.rotate = 180;
+    EXPECT_EQ(firstPageSize(onePage(dir, turned, "r180.pdf")), std::make_pair(100.0, 200.0));
+
+    TestPdf::PageOptions cropped;
+    cropped.cropBox = "[110 60 10 10]";  // corners in any order
+    EXPECT_EQ(firstPageSize(onePage(dir, cropped, "crop.pdf")), std::make_pair(50.0, 100.0));
+
+    TestPdf::PageOptions emptyCrop;
+    emptyCrop.cropBox = "[0 0 0 0]";
+    EXPECT_EQ(firstPageSize(onePage(dir, emptyCrop, "emptycrop.pdf")), std::make_pair(100.0, 200.0));
+
+    TestPdf::PageOptions onlyTrim;
+    onlyTrim.mediaBox = "[5 5 5 5]";
+    onlyTrim.cropBox = "[0 0 0 0]";
+    onlyTrim.trimBox = "[0 0 50 40]";
+    EXPECT_EQ(firstPageSize(onePage(dir, onlyTrim, "trim.pdf")), std::make_pair(40.0, 50.0));
+
+    TestPdf::PageOptions a4;
+    a4.mediaBox = "[0 0 595.27559 841.88976]";
+    EXPECT_EQ(firstPageSize(onePage(dir, a4, "a4.pdf")), std::make_pair(841.8897, 595.2755));
+}
+
+TEST(PdfInspection, RotationInheritedFromThePageTree) {
+    TempDir dir;
+    TestPdf pdf;
+    pdf.addPage("", "<< >>");
+    pdf.qpdf().getRoot().getKey("/Pages").replaceKey("/Rotate", QPDFObjectHandle::newInteger(450));
+    std::string path = (dir / "inherit.pdf").string();
+    pdf.write(path);
+    EXPECT_EQ(firstPageSize(path), std::make_pair(200.0, 100.0));
+}
+
+class PdfBadInput : public ::testing::Test {
+protected:
+    // Page count, size and ink scan of one bad file: nothing thrown, nothing crashed.
+    void expectUnreadable(const std::string& path, bool expectMessage = true) {
+        Context ctx;
+        testing::internal::CaptureStderr();
+        EXPECT_EQ(getPDFPageCount(ctx.fs, path.c_str()), 0);
+        std::string message = testing::internal::GetCapturedStderr();
+        if (expectMessage) {
+            EXPECT_EQ(message, "Unable to open " + path + "\n");
+        }
+        EXPECT_EQ(firstPageSize(path), std::make_pair(-1.0, -1.0));  // left alone
+        std::vector<std::string> inks;
+        testing::internal::CaptureStderr();
+        scanPDFPageInks(path.c_str(), inks);
+        testing::internal::GetCapturedStderr();
+        EXPECT_TRUE(inks.empty());
+    }
+    TempDir dir;
+};
+
+TEST_F(PdfBadInput, MissingEmptyAndNotAPdf) {
+    expectUnreadable((dir / "missing.pdf").string());
+    vorlan::test::writeFile(dir / "empty.pdf", "");
+    expectUnreadable((dir / "empty.pdf").string());
+    vorlan::test::writeFile(dir / "text.pdf", "hello, this is not a PDF\n");
+    expectUnreadable((dir / "text.pdf").string());
+    expectUnreadable(dir.path().string());  // a folder
+}
+
+TEST_F(PdfBadInput, TruncatedAndCorruptFilesNeverCrash) {
+    TestPdf pdf;
+    std::string resources = "<< /ColorSpace << /CS0 " + pdf.separation("Gold") + " >> >>";
+    for (int i = 0; i < 4; ++i) pdf.addPage("/CS0 cs 1 scn 0 0 10 10 re f", resources);
+    std::string good = (dir / "good.pdf").string();
+    pdf.write(good);
+    std::string bytes = vorlan::test::readFile(good);
+    ASSERT_GT(bytes.size(), 400u);
+    Context ctx;
+    for (size_t cut : {bytes.size() / 4, bytes.size() / 2, bytes.size() - 30}) {
+        std::string path = (dir / ("cut" + std::to_string(cut) + ".pdf")).string();
+        vorlan::test::writeFile(path, bytes.substr(0, cut));
+        testing::internal::CaptureStderr();
+        int count = getPDFPageCount(ctx.fs, path.c_str());
+        std::vector<std::string> inks;
+        scanPDFPageInks(path.c_str(), inks);
+        testing::internal::GetCapturedStderr();
+        EXPECT_GE(count, 0);
+        EXPECT_LE(count, 4);
+        EXPECT_LE(inks.size(), 4u);
+    }
+    // Overwrite stretches with garbage: repair may or may not succeed, never crash.
+    for (size_t at = 0; at + 64 < bytes.size(); at += bytes.size() / 7) {
+        std::string damaged = bytes;
+        for (size_t i = 0; i < 64; ++i) damaged[at + i] = static_cast<char>((i * 37 + at) & 0xff);
+        std::string path = (dir / ("bad" + std::to_string(at) + ".pdf")).string();
+        vorlan::test::writeFile(path, damaged);
+        testing::internal::CaptureStderr();
+        EXPECT_LE(getPDFPageCount(ctx.fs, path.c_str()), 4);
+        std::vector<std::string> inks;
+        scanPDFPageInks(path.c_str(), inks);
+        double h = 0, w = 0;
+        getFirstPageSize(ctx.fs, path.c_str(), &h, &w);
+        testing::internal::GetCapturedStderr();
+    }
+}
+
+TEST_F(PdfBadInput, EncryptedFiles) {
+    if (!vorlan::test::haveProgram("qpdf")) GTEST_SKIP() << "qpdf command not installed";
+    TestPdf pdf;
+    pdf.addPage("0 0 m 1 1 l S");
+    std::string plain = (dir / "plain.pdf").string();
+    pdf.write(plain);
+    std::string locked = (dir / "locked.pdf").string();
+    std::string open = (dir / "open.pdf").string();
+    ASSERT_EQ(vorlan::test::runCommand("qpdf --encrypt secret owner 256 -- " + plain + " " + locked), 0);
+    ASSERT_EQ(vorlan::test::runCommand("qpdf --encrypt '' owner 256 -- " + plain + " " + open), 0);
+    expectUnreadable(locked);
+    Context ctx;
+    EXPECT_EQ(getPDFPageCount(ctx.fs, open.c_str()), 1);  // no user password: readable
+}
