@@ -48,7 +48,7 @@ wchar_t* LD_CopyText(const wchar_t* text);                 // exact-size copy; n
 void LD_SetTextBuffer(wchar_t* buffer, const wchar_t* text);  // copies, cutting at the buffer size
 void LD_FreeTextList(std::vector<wchar_t*>& list);         // frees every entry and clears
 
-struct VORLAN_API LD_PDF {
+struct LD_PDF {
     int32_t index = -1;
     wchar_t* url = nullptr;
     wchar_t* mimeType = nullptr;
@@ -69,7 +69,7 @@ struct VORLAN_API LD_PDF {
     LD_PDF& operator=(const LD_PDF&) = delete;
 };
 
-struct VORLAN_API LD_Run {
+struct LD_Run {
     wchar_t* runName = nullptr;
     int32_t runNumber = 0;
     std::vector<int32_t> pages;
@@ -90,7 +90,7 @@ struct VORLAN_API LD_Run {
     LD_Run& operator=(const LD_Run&) = delete;
 };
 
-struct VORLAN_API LD_OCG_InterpretingParams {
+struct LD_OCG_InterpretingParams {
     wchar_t* runName = nullptr;
     int32_t runNumber = 0;
     LD_Status status = 7;
@@ -108,17 +108,17 @@ struct VORLAN_API LD_OCG_InterpretingParams {
     LD_OCG_InterpretingParams& operator=(const LD_OCG_InterpretingParams&) = delete;
 };
 
-struct VORLAN_API LD_OCG_RenderingParams {
+struct LD_OCG_RenderingParams {
     LD_Status status = 0;
     const wchar_t* Class = L"Parameter";
     bool Interleaved = true;
 };
 
-struct VORLAN_API LD_OCG_Digital_Printing_Params {
+struct LD_OCG_Digital_Printing_Params {
     const wchar_t* Class = L"Parameter";
 };
 
-struct VORLAN_API LD_OCG_Media {
+struct LD_OCG_Media {
     wchar_t* Class = nullptr;  // "Consumable"
     LD_Status status = 3;
     double height = -1;
@@ -135,7 +135,7 @@ struct VORLAN_API LD_OCG_Media {
     LD_OCG_Media& operator=(const LD_OCG_Media& other);
 };
 
-struct VORLAN_API LD_Point {
+struct LD_Point {
     double x = -1;
     double y = -1;
     wchar_t* text = nullptr;
@@ -146,7 +146,7 @@ struct VORLAN_API LD_Point {
     LD_Point& operator=(const LD_Point& other);
 };
 
-struct VORLAN_API LD_Box {
+struct LD_Box {
     LD_Point lowerLeft;
     LD_Point upperRight;
     wchar_t* text = nullptr;
@@ -157,7 +157,7 @@ struct VORLAN_API LD_Box {
     LD_Box& operator=(const LD_Box& other);
 };
 
-struct VORLAN_API LD_CTM {
+struct LD_CTM {
     double a = 1, b = 0, c = 0, d = 1, e = 0, f = 0;
     wchar_t* text = nullptr;
 
@@ -168,7 +168,7 @@ struct VORLAN_API LD_CTM {
 };
 
 // Operands of one clip-path operation; the geometry parser defines one subclass per operator.
-class VORLAN_API LD_ClipPathOperands {
+class LD_ClipPathOperands {
 public:
     virtual ~LD_ClipPathOperands();
     virtual LD_ClipPathOperands* clone() const = 0;
@@ -184,7 +184,7 @@ enum LD_ClipPathOperator : int32_t {
     CLIP_RECTANGLE = 6,
 };
 
-struct VORLAN_API LD_ClipPathOperations {
+struct LD_ClipPathOperations {
     int32_t operation = CLIP_MOVETO;
     LD_ClipPathOperands* operands = nullptr;  // null for closepath; owned
 
@@ -194,7 +194,7 @@ struct VORLAN_API LD_ClipPathOperations {
     LD_ClipPathOperations& operator=(const LD_ClipPathOperations&) = delete;
 };
 
-struct VORLAN_API LD_ContentObject {
+struct LD_ContentObject {
     int32_t objectIndex = -1;
     int32_t contentObjectIndex = -1;
     int32_t surfaceIndex = -1;
@@ -216,7 +216,7 @@ struct VORLAN_API LD_ContentObject {
     LD_ContentObject* copy() const;  // deep copy: shares no pointer with this object
 };
 
-struct VORLAN_API LD_MarkObject {
+struct LD_MarkObject {
     int32_t objectIndex = -1;
     int32_t markObjectIndex = -1;
     int32_t surfaceIndex = -1;
@@ -233,12 +233,12 @@ struct VORLAN_API LD_MarkObject {
     LD_MarkObject* copy() const;  // deep copy
 };
 
-struct VORLAN_API LD_Range {
+struct LD_Range {
     int32_t first = -1;
     int32_t last = -1;
 };
 
-struct VORLAN_API LD_Surface {
+struct LD_Surface {
     int32_t index = -1;
     int32_t sheetIndex = -1;
     bool isFront = false;
@@ -262,7 +262,7 @@ struct VORLAN_API LD_Surface {
     LD_Surface* copy() const;
 };
 
-struct VORLAN_API LD_Sheet {
+struct LD_Sheet {
     int32_t index = -1;
     int32_t numberInSignature = -1;
     int32_t signatureIndex = -1;
@@ -277,7 +277,7 @@ struct VORLAN_API LD_Sheet {
     LD_Sheet& operator=(const LD_Sheet&) = delete;
 };
 
-struct VORLAN_API LD_Signature {
+struct LD_Signature {
     int32_t index = -1;
     wchar_t* name = nullptr;  // text buffer
     LD_Range sheetRange;
@@ -290,20 +290,20 @@ struct VORLAN_API LD_Signature {
     LD_Signature& operator=(const LD_Signature&) = delete;
 };
 
-struct VORLAN_API LD_ContentTableElement {
+struct LD_ContentTableElement {
     LD_PDF* pdf = nullptr;
     int32_t page = 10000;
     LD_Run* run = nullptr;
     LD_OCG_InterpretingParams* interpretingParams = nullptr;
 };
 
-struct VORLAN_API LD_MarkTableElement {
+struct LD_MarkTableElement {
     LD_PDF* pdf = nullptr;
     int32_t page = 10000;
     LD_Run* run = nullptr;
 };
 
-struct VORLAN_API LD_OrdinalTableElement {
+struct LD_OrdinalTableElement {
     int32_t ordinal = 0;
     LD_ContentTableElement* content = nullptr;  // owned
     LD_MarkTableElement* mark = nullptr;        // owned
@@ -316,12 +316,12 @@ struct VORLAN_API LD_OrdinalTableElement {
 };
 
 // One entry of the content-object ordinal map: a content object's Ord and its index.
-struct VORLAN_API LD_ContentObjectOrdinal {
+struct LD_ContentObjectOrdinal {
     int32_t ord = 0;
     int32_t contentObjectIndex = 0;
 };
 
-struct VORLAN_API LD_DieCut {
+struct LD_DieCut {
     int32_t index = 0;
     std::vector<wchar_t*> dieLayerInternalNames;
     std::vector<wchar_t*> dieSepInternalNames;
@@ -333,4 +333,4 @@ struct VORLAN_API LD_DieCut {
 };
 
 // Element of the audit pool list, which stays empty.
-struct VORLAN_API LD_AuditData {};
+struct LD_AuditData {};

@@ -8,7 +8,7 @@
 
 #include "vorlan_export.h"
 
-struct VORLAN_API XMLContentObjectData {
+struct XMLContentObjectData {
     int32_t index = 0;
     std::vector<wchar_t*> layerNameOn;
     std::vector<wchar_t*> layerNameOff;
@@ -21,7 +21,7 @@ struct VORLAN_API XMLContentObjectData {
     XMLContentObjectData& operator=(const XMLContentObjectData&) = delete;
 };
 
-struct VORLAN_API XMLSurfaceData {
+struct XMLSurfaceData {
     int32_t index = 0;
     int32_t pageIndex = 0;
     std::vector<XMLContentObjectData*> contentObjects;  // owned
@@ -32,7 +32,7 @@ struct VORLAN_API XMLSurfaceData {
     XMLSurfaceData& operator=(const XMLSurfaceData&) = delete;
 };
 
-struct VORLAN_API XMLVersionData {
+struct XMLVersionData {
     wchar_t* name = nullptr;
     int32_t position = 0;
     int64_t copies = 0;
@@ -46,7 +46,7 @@ struct VORLAN_API XMLVersionData {
 };
 
 // The optional-content groups of one PDF. OCG-name and display-name lists of one kind are parallel.
-struct VORLAN_API XMLLayerData {
+struct XMLLayerData {
     std::vector<wchar_t*> sepOCGNames;
     std::vector<wchar_t*> sepDisplayNames;
     std::vector<wchar_t*> layerOCGNames;

@@ -1,59 +1,13 @@
 // The C entry points. No exception crosses this boundary: anything thrown becomes LD_FAILED.
-#include <cstdio>
 #include <cstdlib>
 #include <cstring>
-#include <new>
 
+#include "entry/description_file.h"
 #include "pdf/xmp_scan.h"
 #include "versions/valid_description.h"
 #include "vorlan/JDFinterface.h"
 #include "vorlan/vorlan.h"
 
-namespace {
-
-// The job number from ".../job<N>.impinfo"; -1 when the file name does not start with job<N>.
-int jobNumberFromDescriptionPath(const char* impinfoPath) {
-    if (!impinfoPath) return -1;
-    const char* slash = std::strrchr(impinfoPath, '/');
-    if (!slash) return -1;
-    int number = -1;
-    if (std::sscanf(slash + 1, "job%d.impinfo", &number) != 1) return -1;
-    return number;
-}
-
-// Reads the whole description file into a zeroed buffer 16 bytes larger than the file.
-// Returns false only when memory runs out; *buffer stays null when the file cannot be read.
-bool readDescriptionFile(const char* path, char** buffer, long* length) {
-    *buffer = nullptr;
-    *length = 0;
-    FILE* in = path ? std::fopen(path, "rb") : nullptr;
-    if (!in) {
-        std::fputs("Invalid or absent xml buffer file, continuing as unversioned job... \n", stderr);
-        return true;
-    }
-    long size = -1;
-    if (std::fseek(in, 0, SEEK_END) == 0) size = std::ftell(in);
-    std::rewind(in);
-    if (size < 0) {
-        // Not seekable (a pipe, a folder): treat it like an unreadable description.
-        std::fclose(in);
-        std::fputs("Invalid or absent xml buffer file, continuing as unversioned job... \n", stderr);
-        return true;
-    }
-    auto* bytes = static_cast<char*>(std::calloc(static_cast<size_t>(size) + 16, 1));
-    if (!bytes) {
-        std::fclose(in);
-        std::fputs("Not enough memory!\n", stderr);
-        return false;
-    }
-    size_t got = std::fread(bytes, 1, static_cast<size_t>(size), in);
-    std::fclose(in);
-    *buffer = bytes;
-    *length = static_cast<long>(got);  // a file that shrank meanwhile yields only what was read
-    return true;
-}
-
-}  // namespace
 
 extern "C" {
 

@@ -72,6 +72,8 @@ int runConsume(Args args) {
     OutputNamer namer;
     namer.folder = outDir.empty() ? fs::path(output).parent_path() : fs::path(outDir);
     if (namer.folder.empty()) namer.folder = ".";
+    std::error_code madeEc;
+    fs::create_directories(namer.folder, madeEc);
 
     std::vector<char> outputBuffer(output.begin(), output.end());
     outputBuffer.push_back('\0');

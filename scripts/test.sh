@@ -1,0 +1,21 @@
+#!/usr/bin/env bash
+# Sets up, builds and runs every test: the development build, then the sanitizer build
+# (AddressSanitizer + UndefinedBehaviorSanitizer), then a short bounded fuzz run.
+# Fails when any step or test fails.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+
+scripts/setup.sh
+
+cmake --preset dev
+cmake --build --preset dev
+ctest --preset dev
+
+cmake --preset asan
+cmake --build --preset asan
+ctest --preset asan
+
+if [ -x scripts/fuzz-short.sh ]; then
+  scripts/fuzz-short.sh
+fi
+echo "test: all passed"

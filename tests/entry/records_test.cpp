@@ -1,0 +1,137 @@
+// Defaults, deep copies and release of the job model.
+#include <gtest/gtest.h>
+
+#include "vorlan/JDFinterface.h"
+
+namespace {
+
+// Operands of a rectangle, enough to exercise the clip-path copy.
+class RectOperands : public LD_ClipPathOperands {
+public:
+    explicit RectOperands(double w) : width(w) {}
+    LD_ClipPathOperands* clone() const override { return new RectOperands(width); }
+    double width;
+};
+
+LD_Surface* surfaceWithEverything() {
+    auto* surface = new LD_Surface;
+    surface->index = 3;
+    surface->VersionName = LD_CopyText(L"English");
+    surface->media = new LD_OCG_Media;
+    surface->media->DescriptiveName = LD_CopyText(L"Gloss");
+    surface->contentType = CONTENT_CONTENT;
+    auto* object = new LD_ContentObject;
+    object->CTM->e = 10;
+    object->CTM->text = LD_CopyText(L"1 0 0 1 10 0");
+    object->ClipBox = new LD_Box;
+    object->ClipBox->text = LD_CopyText(L"0 0 10 10");
+    object->TrimSize = new LD_Point;
+    object->TrimCTM = new LD_CTM;
+    object->ClipPath = new std::vector<LD_ClipPathOperations*>;
+    auto* op = new LD_ClipPathOperations;
+    op->operation = CLIP_RECTANGLE;
+    op->operands = new RectOperands(5);
+    object->ClipPath->push_back(op);
+    object->clipPathText = LD_CopyText(L"0 0 5 5 re");
+    surface->contentObjects.push_back(object);
+    auto* mark = new LD_MarkObject;
+    mark->ClipBox = new LD_Box;
+    surface->markObjects.push_back(mark);
+    return surface;
+}
+
+}  // namespace
+
+TEST(Records, FreshWorkerDefaults) {
+    JDFinterface facade(nullptr, nullptr, nullptr);
+    EXPECT_EQ(facade.JDF_GetNumberOfLogicalPages(), 0);
+    EXPECT_EQ(facade.JDF_GetNumberOfLogicalDocs(), 1);
+    EXPECT_EQ(facade.JDF_GetNumberOfSignatures(), 0);
+    EXPECT_EQ(facade.JDF_GetNumberOfSheets(), 0);
+    EXPECT_EQ(facade.JDF_GetNumberOfSurfaces(), 0);
+    EXPECT_EQ(facade.JDF_GetMaxOrdinalNumber(), -1);
+    EXPECT_TRUE(facade.JDF_GetAllContentPDFs()->empty());
+    EXPECT_TRUE(facade.JDF_GetAllContentRuns()->empty());
+    EXPECT_TRUE(facade.JDF_GetGlobalRenderingParams()->Interleaved);
+    LD_OCG_Media* media = facade.JDF_GetGlobalMediaSettings();
+    EXPECT_STREQ(media->Class, L"Consumable");
+    EXPECT_EQ(media->status, 3);
+    EXPECT_EQ(media->width, -1);
+    EXPECT_EQ(media->height, -1);
+    EXPECT_THROW(facade.JDF_GetSignaturesInLayoutByIndex(0), std::out_of_range);
+    EXPECT_THROW(facade.JDF_GetRangeOfSheetsPerSignature(-1), std::out_of_range);
+}
+
+TEST(Records, NewRecordsCarryTheirDefaults) {
+    LD_ContentObject object;
+    EXPECT_NE(object.CTM, nullptr);
+    EXPECT_EQ(object.CTM->a, 1);
+    EXPECT_EQ(object.CTM->d, 1);
+    EXPECT_EQ(object.ClipBox, nullptr);
+    EXPECT_EQ(object.ClipPath, nullptr);
+    EXPECT_EQ(object.TrimCTM, nullptr);
+    EXPECT_EQ(object.TrimSize, nullptr);
+    EXPECT_EQ(object.Ord, -1);
+    LD_Run run;
+    EXPECT_EQ(run.NPage, -1);
+    EXPECT_EQ(run.SkipPage, 2147483647);
+    EXPECT_EQ(run.contentType, CONTENT_UNDEFINED);
+    LD_OCG_InterpretingParams params;
+    EXPECT_STREQ(params.OCGDefault, L"FromPDF");
+    EXPECT_STREQ(params.OCGIntent, L"View");
+    EXPECT_EQ(params.status, 7);
+    LD_Box box;
+    EXPECT_EQ(box.lowerLeft.x, -1);
+    EXPECT_EQ(box.upperRight.y, -1);
+}
+
+TEST(Records, TextBuffersCutLongValues) {
+    wchar_t* buffer = LD_NewTextBuffer();
+    std::wstring longText(2000, L'x');
+    LD_SetTextBuffer(buffer, longText.c_str());
+    EXPECT_EQ(std::wcslen(buffer), LD_TEXT_BUFFER_CHARS - 1);
+    std::free(buffer);
+}
+
+TEST(Records, SurfaceCopySharesNoPointer) {
+    LD_Surface* source = surfaceWithEverything();
+    LD_Surface* copy = source->copy();
+    EXPECT_EQ(copy->contentType, CONTENT_DIE_ONLY);
+    EXPECT_NE(copy->SurfaceContentsBox, source->SurfaceContentsBox);
+    EXPECT_NE(copy->media, source->media);
+    EXPECT_NE(copy->media->DescriptiveName, source->media->DescriptiveName);
+    EXPECT_NE(copy->VersionName, source->VersionName);
+    ASSERT_EQ(copy->contentObjects.size(), 1u);
+    LD_ContentObject* a = source->contentObjects[0];
+    LD_ContentObject* b = copy->contentObjects[0];
+    EXPECT_NE(a->CTM, b->CTM);
+    EXPECT_NE(a->CTM->text, b->CTM->text);
+    EXPECT_NE(a->ClipBox, b->ClipBox);
+    EXPECT_NE(a->ClipBox->text, b->ClipBox->text);
+    EXPECT_NE(a->ClipPath, b->ClipPath);
+    EXPECT_NE((*a->ClipPath)[0]->operands, (*b->ClipPath)[0]->operands);
+    EXPECT_NE(a->clipPathText, b->clipPathText);
+    EXPECT_NE(source->markObjects[0]->ClipBox, copy->markObjects[0]->ClipBox);
+    b->CTM->e = 99;
+    EXPECT_EQ(a->CTM->e, 10);
+    delete source;
+    EXPECT_STREQ(copy->VersionName, L"English");  // still intact after the source is gone
+    delete copy;
+}
+
+TEST(Records, WorkerCopiesShareRecordsAndReleaseThemOnce) {
+    auto* original = new LD_JDF;
+    auto* signature = new LD_Signature;
+    auto* sheet = new LD_Sheet;
+    sheet->front = surfaceWithEverything();
+    signature->sheetList.push_back(sheet);
+    original->signatures.push_back(signature);
+    original->contentPDFs.push_back(new LD_PDF);
+    LD_JDF copy(*original);
+    EXPECT_EQ(copy.signatures[0], signature);  // shared, not duplicated
+    delete original;                            // the copy still holds them
+    EXPECT_EQ(copy.signatures[0]->sheetList[0]->front->index, 3);
+    LD_JDF moved(std::move(copy));
+    EXPECT_TRUE(copy.signatures.empty());
+    // moved's destructor frees everything; ASan reports any leak or double free
+}
