@@ -1,0 +1,125 @@
+// Documents: creation of new JDF documents and atomic writing.
+#include "platform/jdf/jdf_doc.h"
+
+#include <cerrno>
+#include <cstdio>
+#include <cstdlib>
+#include <ctime>
+#include <sstream>
+#include <string>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include "platform/jdf/exception.h"
+
+namespace JDF {
+namespace {
+
+constexpr unsigned kFormat = pugi::format_indent;
+const char* const kIndent = "  ";
+
+class FdWriter : public pugi::xml_writer {
+public:
+    explicit FdWriter(int fd) : fd_(fd) {}
+    void write(const void* data, size_t size) override {
+        const char* p = static_cast<const char*>(data);
+        while (ok_ && size > 0) {
+            ssize_t n = ::write(fd_, p, size);
+            if (n < 0 && errno == EINTR) continue;
+            if (n <= 0) {
+                ok_ = false;
+                break;
+            }
+            p += n;
+            size -= static_cast<size_t>(n);
+        }
+    }
+    bool ok() const { return ok_; }
+
+private:
+    int fd_;
+    bool ok_ = true;
+};
+
+// Current time, or SOURCE_DATE_EPOCH when set, as an xs:dateTime in UTC.
+std::string timeStamp() {
+    std::time_t t = std::time(nullptr);
+    if (const char* epoch = std::getenv("SOURCE_DATE_EPOCH")) {
+        char* end = nullptr;
+        long long v = std::strtoll(epoch, &end, 10);
+        if (end != epoch && *end == '\0') t = static_cast<std::time_t>(v);
+    }
+    std::tm tm{};
+    gmtime_r(&t, &tm);
+    char buf[40];
+    std::strftime(buf, sizeof buf, "%Y-%m-%dT%H:%M:%S+00:00", &tm);
+    return buf;
+}
+
+}  // namespace
+
+KElement XMLDoc::GetRoot() const {
+    if (!doc_) return {};
+    return KElement(doc_->doc.document_element(), doc_);
+}
+
+std::string XMLDoc::ToString() const {
+    if (!doc_) return {};
+    std::ostringstream out;
+    doc_->doc.save(out, kIndent, kFormat, pugi::encoding_utf8);
+    return out.str();
+}
+
+bool XMLDoc::Write2File(const WString& fileName) const {
+    if (!doc_ || fileName.empty()) return false;
+    std::string target = fileName.getUTF8();
+    std::string tmp = target + ".XXXXXX";
+    int fd = ::mkstemp(tmp.data());
+    if (fd < 0) return false;
+    // mkstemp creates 0600: keep the mode of the file being replaced, else rw-r--r--.
+    struct stat st {};
+    ::fchmod(fd, ::stat(target.c_str(), &st) == 0 ? (st.st_mode & 07777) : 0644);
+    FdWriter writer(fd);
+    bool ok = true;
+    try {
+        doc_->doc.save(writer, kIndent, kFormat, pugi::encoding_utf8);
+    } catch (...) {
+        ok = false;
+    }
+    ok = ok && writer.ok() && ::fsync(fd) == 0;
+    ok = (::close(fd) == 0) && ok;
+    if (ok && std::rename(tmp.c_str(), target.c_str()) == 0) return true;
+    std::remove(tmp.c_str());
+    return false;
+}
+
+JDFDoc::JDFDoc(int type) : XMLDoc(std::make_shared<detail::DocumentState>()) {
+    if (type != 0) throw JDFException("JDFDoc: only JDF documents (0) can be created");
+    pugi::xml_document& d = doc_->doc;
+    pugi::xml_node decl = d.append_child(pugi::node_declaration);
+    decl.append_attribute("version").set_value("1.0");
+    decl.append_attribute("encoding").set_value("UTF-8");
+    pugi::xml_node root = d.append_child("JDF");
+    root.append_attribute("xmlns").set_value("http://www.CIP4.org/JDFSchema_1_1");
+    root.append_attribute("Version").set_value("1.3");
+    pugi::xml_node audit = root.append_child("AuditPool").append_child("Created");
+    std::string auditId = doc_->NewID("a");
+    std::string nodeId = doc_->NewID("n");
+    root.append_attribute("ID").set_value(nodeId.c_str());
+    root.append_attribute("JobPartID").set_value(nodeId.c_str());
+    root.append_attribute("Status").set_value("Waiting");
+    audit.append_attribute("ID").set_value(auditId.c_str());
+    audit.append_attribute("AgentName").set_value("vorlan");
+    audit.append_attribute("TimeStamp").set_value(timeStamp().c_str());
+    root.append_child("ResourcePool");
+    root.append_child("ResourceLinkPool");
+}
+
+JDFNode JDFDoc::GetJDFRoot() const {
+    KElement root = GetRoot();
+    return root.GetLocalName() == L"JDF" ? JDFNode(root) : JDFNode();
+}
+
+}  // namespace JDF

@@ -1,0 +1,249 @@
+// Resources: inherited attributes, status, partitions, links and pools.
+#include "platform/jdf/jdf_resource.h"
+
+#include "platform/jdf/enum_tables.h"
+
+namespace JDF {
+
+WString ResourceClassOf(const WString& name) {
+    static const wchar_t* const parameters[] = {
+        L"Layout", L"RunList", L"FileSpec", L"ColorantControl", L"ColorantAlias", L"ColorPool",
+        L"BinderySignature", L"Assembly", L"StrippingParams", L"ImageSetterParams", L"Preview",
+        L"TransferCurvePool", L"DeviceNSpace", L"NodeInfo", L"CustomerInfo", L"ContactInfo", L"Contact",
+        L"Address", L"Person", L"Company", L"LayoutElement", L"PageList", L"Sheet", L"Surface",
+        L"Signature", L"CutBlock", L"ByteMap", L"ObjectResolution", L"Shape", L"DieLayout"};
+    static const wchar_t* const consumables[] = {L"Media", L"Ink", L"Paper", L"Plate", L"Glue", L"Thread"};
+    static const wchar_t* const quantities[] = {L"Component"};
+    static const wchar_t* const handlings[] = {L"ExposedMedia", L"Pallet", L"Bundle", L"Strap"};
+    static const wchar_t* const implementations[] = {L"Device", L"Employee", L"Tool", L"MiscConsumable"};
+    for (const wchar_t* n : parameters) if (name == n) return L"Parameter";
+    for (const wchar_t* n : consumables) if (name == n) return L"Consumable";
+    for (const wchar_t* n : quantities) if (name == n) return L"Quantity";
+    for (const wchar_t* n : handlings) if (name == n) return L"Handling";
+    for (const wchar_t* n : implementations) if (name == n) return L"Implementation";
+    if (name.size() > 6 && name.compare(name.size() - 6, 6, L"Params") == 0) return L"Parameter";
+    if (name.size() > 6 && name.compare(name.size() - 6, 6, L"Intent") == 0) return L"Intent";
+    return {};
+}
+
+// --- JDFResource ----------------------------------------------------------------------------
+
+WString JDFResource::GetAttribute(const WString& key, const WString& ns, const WString& def) const {
+    WString name = GetNodeName();
+    for (KElement e = *this; !e.isNull(); e = e.GetParentNode()) {
+        if (e.HasAttribute(key, ns)) return e.KElement::GetAttribute(key, ns);
+        if (e.GetParentNode().GetNodeName() != name) break;
+    }
+    return def;
+}
+
+bool JDFResource::HasAttribute(const WString& key, const WString& ns, bool bInherit) const {
+    if (!bInherit) return KElement::HasAttribute(key, ns);
+    WString sentinel(L"\x1");
+    return GetAttribute(key, ns, sentinel) != sentinel;
+}
+
+int JDFResource::GetStatus(bool) const {
+    return Tables::Number(Tables::ResourceStatus, GetAttribute(L"Status"));
+}
+
+void JDFResource::SetStatus(int status, bool) { SetEnumAttribute(L"Status", status, Tables::ResourceStatus); }
+
+int JDFResource::GetPartUsage() const {
+    return Tables::Number(Tables::PartUsage, GetResourceRoot().KElement::GetAttribute(L"PartUsage"));
+}
+
+void JDFResource::SetPartUsage(int partUsage) {
+    GetResourceRoot().SetEnumAttribute(L"PartUsage", partUsage, Tables::PartUsage);
+}
+
+int JDFResource::GetSide() const { return Tables::Number(Tables::Side, GetAttribute(L"Side")); }
+
+void JDFResource::SetSide(int side) { SetEnumAttribute(L"Side", side, Tables::Side); }
+
+JDFResource JDFResource::GetResourceRoot() const {
+    KElement e = *this;
+    WString name = GetNodeName();
+    while (!e.isNull()) {
+        KElement parent = e.GetParentNode();
+        if (parent.isNull() || parent.GetNodeName() != name) break;
+        e = parent;
+    }
+    return e;
+}
+
+bool JDFResource::IsResourceRoot() const { return !isNull() && GetResourceRoot() == *this; }
+
+vWString JDFResource::GetPartIDKeys() const {
+    return vWString(GetResourceRoot().KElement::GetAttribute(L"PartIDKeys"));
+}
+
+void JDFResource::setPartIDKeys(const vWString& keys) {
+    JDFResource root = GetResourceRoot();
+    if (keys.empty()) root.RemoveAttribute(L"PartIDKeys");
+    else root.KElement::SetAttribute(L"PartIDKeys", keys.GetString());
+}
+
+void JDFResource::AddPartIDKey(int partIDKey) {
+    vWString keys = GetPartIDKeys();
+    keys.AppendUnique(Tables::Token(Tables::PartIDKey, partIDKey));
+    setPartIDKeys(keys);
+}
+
+JDFAttributeMap JDFResource::GetPartMap() const {
+    JDFAttributeMap map;
+    vWString keys = GetPartIDKeys();
+    WString name = GetNodeName();
+    for (KElement e = *this; !e.isNull(); e = e.GetParentNode()) {
+        if (e.GetNodeName() != name) break;
+        for (const WString& k : keys)
+            if (e.KElement::HasAttribute(k) && !map.count(k)) map[k] = e.KElement::GetAttribute(k);
+    }
+    return map;
+}
+
+JDFResource JDFResource::GetCreatePartition(int partIDKey, const WString& value, const vWString& partIDKeys) {
+    if (isNull()) return {};
+    if (!partIDKeys.empty()) setPartIDKeys(partIDKeys);
+    WString key = Tables::Token(Tables::PartIDKey, partIDKey);
+    for (const KElement& child : GetChildrenByTagName(GetNodeName())) {
+        if (child.KElement::GetAttribute(key, L"", L"\x1") == value) return child;
+    }
+    AddPartIDKey(partIDKey);
+    JDFResource part = AppendElement(GetNodeName());
+    part.KElement::SetAttribute(key, value);
+    return part;
+}
+
+JDFResource JDFResource::GetPartition(const JDFAttributeMap& partMap) const {
+    if (isNull()) return {};
+    if (partMap.empty()) return *this;
+    vElement all = GetChildrenByTagName(GetNodeName(), L"", JDFAttributeMap(), false);
+    for (const KElement& e : all) {
+        JDFAttributeMap have = JDFResource(e).GetPartMap();
+        bool ok = true;
+        for (const auto& [k, v] : partMap) {
+            auto it = have.find(k);
+            if (it == have.end() || it->second != v) { ok = false; break; }
+        }
+        if (ok) return e;
+    }
+    return {};
+}
+
+vElement JDFResource::GetLinks(const WString& linkName) const {
+    vElement out;
+    JDFResource root = GetResourceRoot();
+    WString id = root.GetID();
+    if (id.empty()) return out;
+    bool any = linkName.empty() || linkName == L"*";
+    WString wanted = any ? WString(GetNodeName() + L"Link") : linkName;
+    for (const KElement& pool : GetDocRoot().GetChildrenByTagName(L"ResourceLinkPool", L"", JDFAttributeMap(), false)) {
+        for (const KElement& link : pool.GetChildrenByTagName()) {
+            if (link.KElement::GetAttribute(L"rRef") != id) continue;
+            if (!any && link.GetNodeName() != wanted) continue;
+            out.push_back(link);
+        }
+    }
+    // Ref elements inside other resources also refer to it.
+    if (any) {
+        WString refName = GetNodeName() + L"Ref";
+        for (const KElement& ref : GetDocRoot().GetChildrenByTagName(refName, L"", JDFAttributeMap(L"rRef", id), false))
+            out.push_back(ref);
+    }
+    return out;
+}
+
+// --- JDFPart / JDFResourceLink ----------------------------------------------------------------
+
+void JDFPart::SetSide(int side) { SetEnumAttribute(L"Side", side, Tables::Side); }
+
+void JDFPart::SetPartMap(const JDFAttributeMap& m) {
+    for (const auto& [k, v] : m) SetAttribute(k, v);
+}
+
+int JDFResourceLink::GetUsage() const { return Tables::Number(Tables::LinkUsage, GetAttribute(L"Usage")); }
+
+WString JDFResourceLink::GetLinkedResourceName() const {
+    WString n = GetLocalName();
+    if (n.size() > 4 && n.compare(n.size() - 4, 4, L"Link") == 0) n.resize(n.size() - 4);
+    return n;
+}
+
+JDFResource JDFResourceLink::GetTarget() const {
+    if (isNull() || !doc_) return {};
+    JDFResource root = KElement(doc_->FindByID(node_.attribute("rRef").value()), doc_);
+    vElement parts = GetChildrenByTagName(L"Part");
+    if (parts.size() != 1 || root.isNull()) return root;
+    JDFAttributeMap m = parts[0].GetAttributeMap();
+    return root.GetPartition(m);
+}
+
+// --- pools ------------------------------------------------------------------------------------
+
+vElement JDFResourcePool::GetPoolChildren(const WString& name, const JDFAttributeMap& mAttrib,
+                                          const WString& ns) const {
+    return GetChildrenByTagName(name, ns, mAttrib, true);
+}
+
+JDFResource JDFResourcePool::GetResource(const WString& name, int index, const WString& ns) const {
+    return GetElement(name, ns, index);
+}
+
+JDFResource JDFResourcePool::AppendResource(const WString& name, const WString& resourceClass, const WString& ns) {
+    if (isNull() || !doc_) return {};
+    JDFResource r = AppendElement(name, ns);
+    r.KElement::SetAttribute(L"ID", WString(doc_->NewID("r")));
+    r.KElement::SetAttribute(L"Status", L"Unavailable");
+    WString cls = resourceClass.empty() ? ResourceClassOf(name) : resourceClass;
+    if (!cls.empty()) r.KElement::SetAttribute(L"Class", cls);
+    return r;
+}
+
+JDFResource JDFResourcePool::CopyResource(const JDFResource& src) {
+    if (isNull() || src.isNull() || !doc_) return {};
+    WString id = src.GetID();
+    bool clash = !id.empty() && doc_->FindByID(id.getUTF8().c_str());
+    JDFResource r = CopyElement(src);
+    if (clash) r.KElement::SetAttribute(L"ID", WString(doc_->NewID("r")));
+    return r;
+}
+
+vElement JDFResourceLinkPool::GetPoolChildren(const WString& name, const JDFAttributeMap& mAttrib,
+                                              const WString& ns) const {
+    if (name.empty() || name == L"*") return GetChildrenByTagName(L"*", ns, mAttrib, true);
+    // Resource names select their links.
+    WString linkName = name.size() > 4 && name.compare(name.size() - 4, 4, L"Link") == 0 ? name : WString(name + L"Link");
+    return GetChildrenByTagName(linkName, ns, mAttrib, true);
+}
+
+JDFResourceLink JDFResourceLinkPool::AppendResource(const JDFResource& r, bool bInput) {
+    if (isNull() || r.isNull()) return {};
+    JDFResource root = r.GetResourceRoot();
+    WString id = root.GetID();
+    if (id.empty()) return {};
+    WString usage = bInput ? L"Input" : L"Output";
+    JDFAttributeMap part = r.IsResourceRoot() ? JDFAttributeMap() : r.GetPartMap();
+    for (const KElement& e : GetChildrenByTagName(root.GetNodeName() + L"Link")) {
+        JDFResourceLink link(e);
+        if (link.GetrRef() != id || link.GetAttribute(L"Usage") != usage) continue;
+        vElement parts = link.GetChildrenByTagName(L"Part");
+        if ((part.empty() && parts.empty()) || (parts.size() == 1 && parts[0].GetAttributeMap() == part))
+            return {};
+    }
+    JDFResourceLink link = AppendElement(root.GetNodeName() + L"Link");
+    link.SetAttribute(L"rRef", id);
+    link.SetAttribute(L"Usage", usage);
+    if (!part.empty()) link.AppendPart().SetPartMap(part);
+    return link;
+}
+
+JDFResourceLink JDFResourceLinkPool::GetLink(const JDFResource& r) const {
+    WString id = r.GetResourceRoot().GetID();
+    if (id.empty()) return {};
+    for (const KElement& e : GetChildrenByTagName(r.GetResourceRoot().GetNodeName() + L"Link"))
+        if (e.GetAttribute(L"rRef") == id) return e;
+    return {};
+}
+
+}  // namespace JDF

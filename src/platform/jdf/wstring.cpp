@@ -1,0 +1,67 @@
+// Wide text: UTF-8 conversion, tokens, number formatting.
+#include "platform/jdf/wstring.h"
+
+#include <charconv>
+#include <cstdio>
+
+#include <pugixml.hpp>
+
+namespace JDF {
+
+WString::WString(const char* utf8) : std::wstring(utf8 ? pugi::as_wide(utf8) : std::wstring()) {}
+WString::WString(const std::string& utf8) : std::wstring(pugi::as_wide(utf8)) {}
+
+std::string WString::getUTF8() const { return pugi::as_utf8(*this); }
+
+vWString WString::Tokenize(const WString& separators) const {
+    return vWString(*this, separators);
+}
+
+bool WString::HasToken(const WString& token, const WString& separators) const {
+    return Tokenize(separators).contains(token);
+}
+
+WString WString::valueOf(int value) { return WString(std::to_wstring(value)); }
+WString WString::valueOf(unsigned int value) { return WString(std::to_wstring(value)); }
+WString WString::valueOf(long long value) { return WString(std::to_wstring(value)); }
+
+WString WString::valueOf(double value) {
+    char buf[64];
+    auto res = std::to_chars(buf, buf + sizeof buf, value);
+    return WString(std::string(buf, res.ptr));
+}
+
+vWString::vWString(const WString& text, const WString& separators) {
+    size_t pos = 0;
+    while (pos < text.size()) {
+        size_t start = text.find_first_not_of(separators, pos);
+        if (start == WString::npos) break;
+        size_t end = text.find_first_of(separators, start);
+        if (end == WString::npos) end = text.size();
+        push_back(WString(text.substr(start, end - start)));
+        pos = end;
+    }
+}
+
+bool vWString::contains(const WString& s) const { return index(s) >= 0; }
+
+int vWString::index(const WString& s) const {
+    for (size_t i = 0; i < size(); ++i)
+        if ((*this)[i] == s) return static_cast<int>(i);
+    return -1;
+}
+
+WString vWString::GetString(const WString& sep) const {
+    WString out;
+    for (size_t i = 0; i < size(); ++i) {
+        if (i) out += sep;
+        out += (*this)[i];
+    }
+    return out;
+}
+
+void vWString::AppendUnique(const WString& s) {
+    if (!contains(s)) push_back(s);
+}
+
+}  // namespace JDF
