@@ -103,11 +103,19 @@ void TestPdf::write(const std::string& path) {
     writer.write();
 }
 
+namespace {
+std::string xmlText(const std::string& text) {
+    std::string out;
+    for (char c : text) out += c == '&' ? "&amp;" : c == '<' ? "&lt;" : std::string(1, c);
+    return out;
+}
+}  // namespace
+
 std::string eskoXmp(const std::vector<TestInk>& inks) {
     std::string items;
     for (const TestInk& ink : inks) {
         items += "       <rdf:li rdf:parseType=\"Resource\">\n";
-        if (!ink.name.empty()) items += "        <egInk:name>" + ink.name + "</egInk:name>\n";
+        if (!ink.name.empty()) items += "        <egInk:name>" + xmlText(ink.name) + "</egInk:name>\n";
         if (!ink.type.empty()) items += "        <egInk:type>" + ink.type + "</egInk:type>\n";
         items += "        <egInk:book>PANTONE+ Solid Coated</egInk:book>\n";
         if (!ink.attribute.empty()) items += "        <egInk:attribute>" + ink.attribute + "</egInk:attribute>\n";

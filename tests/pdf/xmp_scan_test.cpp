@@ -1,0 +1,271 @@
+// The Esko XMP ink list, the die library and the two descriptions the scan writes.
+#include <gtest/gtest.h>
+
+#include <expat.h>
+
+#include <cstdlib>
+
+#include "pdf/description_writer.h"
+#include "pdf/die_library.h"
+#include "pdf/pdf_session.h"
+#include "pdf/xmp_inks.h"
+#include "pdf/xmp_scan.h"
+#include "test_pdf.h"
+#include "test_support.h"
+
+using vorlan::test::TempDir;
+using vorlan::test::TestInk;
+using vorlan::test::TestPdf;
+
+namespace {
+
+std::vector<XMPInk> read(const std::string& packet, bool expected = true) {
+    std::vector<XMPInk> inks;
+    EXPECT_EQ(readXMPInks(packet.c_str(), inks), expected);
+    return inks;
+}
+
+// A PDF of `pages` pages with a spot per page (the page's name) and an optional XMP packet.
+std::string makePdf(const TempDir& dir, const std::vector<std::string>& pageSpots, const std::string& xmp,
+                    const char* name = "in.pdf") {
+    TestPdf pdf;
+    for (const std::string& spot : pageSpots) {
+        std::string resources = "<< /ColorSpace << /CS0 " + pdf.separation(spot) + " >> >>";
+        pdf.addPage("/CS0 cs 1 scn 0 0 10 10 re f 0 0 0 1 k 1 1 2 2 re f", resources);
+    }
+    if (!xmp.empty()) pdf.setXmp(xmp);
+    std::string path = (dir / name).string();
+    pdf.write(path);
+    return path;
+}
+
+// Attribute values of every element named `element`, read back by a conforming XML parser.
+std::vector<std::string> attributeValues(const std::string& xml, const std::string& element,
+                                         const std::string& attribute) {
+    struct State {
+        std::string element, attribute;
+        std::vector<std::string> values;
+    } state{element, attribute, {}};
+    XML_Parser parser = XML_ParserCreate(nullptr);
+    XML_SetUserData(parser, &state);
+    XML_SetStartElementHandler(parser, [](void* user, const XML_Char* name, const XML_Char** atts) {
+        auto* s = static_cast<State*>(user);
+        if (s->element != name) return;
+        for (; atts[0]; atts += 2)
+            if (s->attribute == atts[0]) s->values.emplace_back(atts[1]);
+    });
+    bool ok = XML_Parse(parser, xml.data(), static_cast<int>(xml.size()), XML_TRUE) != XML_STATUS_ERROR;
+    XML_ParserFree(parser);
+    EXPECT_TRUE(ok) << "not well-formed:\n" << xml;
+    return state.values;
+}
+
+class DieLibraryHome {
+public:
+    explicit DieLibraryHome(const std::string& library) {
+        const char* old = std::getenv("VORLAN_HOME");
+        if (old) saved_ = old, hadOld_ = true;
+        vorlan::test::writeFile(home_ / "DieLib" / "AutoDieLib.xml", library);
+        setenv("VORLAN_HOME", home_.path().c_str(), 1);
+    }
+    ~DieLibraryHome() {
+        if (hadOld_) setenv("VORLAN_HOME", saved_.c_str(), 1);
+        else unsetenv("VORLAN_HOME");
+    }
+
+private:
+    TempDir home_;
+    std::string saved_;
+    bool hadOld_ = false;
+};
+
+const char* kLibrary =
+    "<?xml version=\"1.0\"?>\n<AutoDieLibrary><Layers><Layer Name=\"LayerDie\"/></Layers>"
+    "<Separations><Separation Name=\"Die\" Locked=\"TRUE\"/><Separation Name=\"Crease\" Printable=\"FALSE\"/>"
+    "<Separation/></Separations></AutoDieLibrary>";
+
+}  // namespace
+
+TEST(XmpInks, ReadsTypesAndAttributesAndDropsNamelessItems) {
+    std::vector<XMPInk> inks = read(vorlan::test::eskoXmp({{"cyan", "process", "normal"},
+                                                          {"PANTONE 871 C", "Pantone", "OPAQUE"},
+                                                          {"Gloss", "designer", "varnish"},
+                                                          {"CutLine", "other", "technical"},
+                                                          {"", "process", "technical"},
+                                                          {"Odd", "", ""},
+                                                          {"Strange", "spot", "metallic"}}));
+    ASSERT_EQ(inks.size(), 6u);
+    EXPECT_EQ(inks[0].name, "cyan");
+    EXPECT_EQ(inks[0].type, 0);
+    EXPECT_EQ(inks[0].attribute, 0);
+    EXPECT_EQ(inks[1].type, 1);
+    EXPECT_EQ(inks[1].attribute, 1);
+    EXPECT_EQ(inks[2].attribute, 2);
+    EXPECT_TRUE(isTechnicalVersionInk(inks[2]));
+    EXPECT_FALSE(isDieInk(inks[2]));
+    EXPECT_EQ(inks[3].name, "CutLine");
+    EXPECT_EQ(inks[3].type, 3);
+    EXPECT_TRUE(isDieInk(inks[3]));
+    EXPECT_EQ(inks[4].name, "Odd");  // no type or attribute: the defaults
+    EXPECT_EQ(inks[4].type, 3);
+    EXPECT_EQ(inks[4].attribute, 4);
+    EXPECT_EQ(inks[5].attribute, 4);
+}
+
+TEST(XmpInks, ShapeOfTheList) {
+    // Names compare ignoring case; entities decode; a sequence whose first child is not an item fails.
+    read("<x><EGGR:INKS><RDF:SEQ><rdf:LI><egInk:Name>A &amp; B</egInk:Name></rdf:LI></RDF:SEQ></EGGR:INKS></x>");
+    EXPECT_EQ(read("<x><egGr:inks><rdf:Seq><rdf:li><egInk:name>A &amp; B</egInk:name></rdf:li></rdf:Seq></egGr:inks></x>")[0].name,
+              "A & B");
+    EXPECT_TRUE(read("<x><egGr:inks><rdf:Seq><rdf:Bag/><rdf:li><egInk:name>A</egInk:name></rdf:li></rdf:Seq></egGr:inks></x>",
+                     false).empty());
+    EXPECT_TRUE(read("<x><egGr:inks/></x>", false).empty());
+    EXPECT_TRUE(read("<x><rdf:Seq><rdf:li><egInk:name>A</egInk:name></rdf:li></rdf:Seq></x>", false).empty());
+    EXPECT_TRUE(read("<x><egGr:inks><rdf:Seq></egGr:inks>", false).empty());  // not well-formed
+    // Items that only have names elsewhere (nested deeper) count as walked, yet add nothing.
+    EXPECT_TRUE(read("<x><egGr:inks><rdf:Seq><rdf:li><d><egInk:name>A</egInk:name></d></rdf:li></rdf:Seq></egGr:inks></x>").empty());
+    // Only the first list counts.
+    EXPECT_EQ(read("<x><egGr:inks><rdf:Seq><rdf:li><egInk:name>A</egInk:name></rdf:li></rdf:Seq>"
+                   "<rdf:Seq><rdf:li><egInk:name>B</egInk:name></rdf:li></rdf:Seq></egGr:inks></x>").size(), 1u);
+    std::vector<XMPInk> none;
+    EXPECT_FALSE(readXMPInks(nullptr, none));
+}
+
+TEST(XmpInks, CollectsTechnicalAndDieInksFromTheFile) {
+    TempDir dir;
+    std::string path = makePdf(dir, {"Gold"}, vorlan::test::eskoXmp({{"Gold", "pantone", "normal"},
+                                                                     {"Varnish", "designer", "varnish"},
+                                                                     {"Die", "designer", "technical"}}));
+    std::vector<std::string> technical, die;
+    collectEskoTechnicalInks(path.c_str(), technical, die);
+    EXPECT_EQ(technical, (std::vector<std::string>{"Varnish", "Die"}));
+    EXPECT_EQ(die, (std::vector<std::string>{"Die"}));
+    EXPECT_FALSE(pdfLibraryRunning());
+    collectEskoTechnicalInks((dir / "missing.pdf").c_str(), technical, die);
+    EXPECT_EQ(technical.size(), 2u);
+}
+
+TEST(ScanDescriptionText, ExactLinesAndEscapedNames) {
+    ScanDescription d;
+    d.layerInks = {"Pantone \"Gold\" & Co", "V<1>"};
+    d.offInks = d.layerInks;
+    d.versionName = "EskoTechnicalVersion";
+    d.pageCount = 2;
+    d.writeDieCut = true;
+    d.dieInks = {"Die"};
+    const std::string text = formatScanDescription(d);
+    EXPECT_EQ(text,
+              "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\" ?>\r\n"
+              "<OptionalContentGroupData>\r\n"
+              "<OptionalLayer pdfIndex=\"0\" OCGName=\"Pantone &quot;Gold&quot; &amp; Co\" displayName=\"Pantone &quot;Gold&quot; &amp; Co\" isSep=\"true\"/>\r\n"
+              "<OptionalLayer pdfIndex=\"0\" OCGName=\"V&lt;1&gt;\" displayName=\"V&lt;1&gt;\" isSep=\"true\"/>\r\n"
+              "<Versions>\r\n"
+              "<Version enable=\"true\" name=\"EskoTechnicalVersion\">\r\n"
+              "<Surface index=\" 0 \">\r\n"
+              "<ContentObject index=\"0\" SepNameOff=\"Pantone &quot;Gold&quot; &amp; Co,V&lt;1&gt;\"/>\r\n"
+              "</Surface>\r\n"
+              "<Surface index=\" 1 \">\r\n"
+              "<ContentObject index=\"0\" SepNameOff=\"Pantone &quot;Gold&quot; &amp; Co,V&lt;1&gt;\"/>\r\n"
+              "</Surface>\r\n"
+              "</Version>\r\n"
+              "</Versions>\r\n"
+              "<DieCut enable=\"true\" name=\"AutoDie\">\r\n"
+              "<Surface index=\"0\" dieSepInternalNames=\"Die\"/>\r\n"
+              "</DieCut>\r\n"
+              "</OptionalContentGroupData>\r\n");
+    // A conforming parser reads the names back unchanged.
+    EXPECT_EQ(attributeValues(text, "OptionalLayer", "OCGName"),
+              (std::vector<std::string>{"Pantone \"Gold\" & Co", "V<1>"}));
+    EXPECT_EQ(escapeXmlAttribute("a\tb\nc"), "a&#9;b&#10;c");
+}
+
+TEST(XmpScan, EskoModeWritesTechnicalVersionAndDieCut) {
+    TempDir dir;
+    std::string pdf = makePdf(dir, {"Gold", "Gold", "Gold"},
+                              vorlan::test::eskoXmp({{"cyan", "process", "normal"},
+                                                     {"Gloss", "designer", "varnish"},
+                                                     {"Cut & \"Crease\"", "designer", "technical"}}));
+    std::string out = (dir / "job1.impinfo").string();
+    EXPECT_EQ(scanPdfInksToDescription(pdf.c_str(), out.data(), false), 1);
+    EXPECT_FALSE(pdfLibraryRunning());
+    std::string text = vorlan::test::readFile(out);
+    EXPECT_EQ(attributeValues(text, "OptionalLayer", "OCGName"),
+              (std::vector<std::string>{"Gloss", "Cut & \"Crease\""}));
+    EXPECT_EQ(attributeValues(text, "Surface", "index"), (std::vector<std::string>{" 0 ", " 1 ", " 2 ", "0"}));
+    EXPECT_EQ(attributeValues(text, "ContentObject", "SepNameOff")[0], "Gloss,Cut & \"Crease\"");
+    EXPECT_EQ(attributeValues(text, "Surface", "dieSepInternalNames"),
+              (std::vector<std::string>{"Cut & \"Crease\""}));
+    EXPECT_NE(text.find("name=\"EskoTechnicalVersion\""), std::string::npos);
+}
+
+TEST(XmpScan, EskoModeEdgeCases) {
+    TempDir dir;
+    std::string out = (dir / "out.impinfo").string();
+    // Only varnish: no die cut.
+    std::string varnish = makePdf(dir, {"A"}, vorlan::test::eskoXmp({{"Gloss", "designer", "varnish"}}), "v.pdf");
+    EXPECT_EQ(scanPdfInksToDescription(varnish.c_str(), out.data(), false), 1);
+    std::string text = vorlan::test::readFile(out);
+    EXPECT_NE(text.find("SepNameOff=\"Gloss\""), std::string::npos);
+    EXPECT_EQ(text.find("DieCut"), std::string::npos);
+    std::filesystem::remove(out);
+    // Normal and opaque inks only, no XMP, a missing or damaged file: nothing written, result 1.
+    std::string normal = makePdf(dir, {"A"}, vorlan::test::eskoXmp({{"A", "pantone", "normal"}, {"W", "designer", "opaque"}}), "n.pdf");
+    std::string bare = makePdf(dir, {"A"}, "", "bare.pdf");
+    vorlan::test::writeFile(dir / "junk.pdf", "%PDF-1.4\njunk");
+    for (std::string in : {normal, bare, (dir / "missing.pdf").string(), (dir / "junk.pdf").string()}) {
+        EXPECT_EQ(scanPdfInksToDescription(in.c_str(), out.data(), false), 1);
+        EXPECT_FALSE(std::filesystem::exists(out)) << in;
+    }
+    // An output that cannot be created: nothing written, no error.
+    std::string blocked = (dir / "no" / "such" / "folder" / "x.impinfo").string();
+    EXPECT_EQ(scanPdfInksToDescription(varnish.c_str(), blocked.data(), false), 1);
+    EXPECT_EQ(scanPdfInksToDescription(varnish.c_str(), nullptr, false), 1);
+}
+
+TEST(XmpScan, DieLibraryModeMatchesPageInksAgainstSeparations) {
+    TempDir dir;
+    DieLibraryHome home(kLibrary);
+    std::string pdf = makePdf(dir, {"Die", "Gold", "Die", "LayerDie", "Crease"}, "");
+    std::string out = (dir / "die.impinfo").string();
+    EXPECT_EQ(scanPdfInksToDescription(pdf.c_str(), out.data(), true), 2);
+    std::string text = vorlan::test::readFile(out);
+    // Page order, repeats kept; a library Layer of the same name is no die ink.
+    EXPECT_EQ(attributeValues(text, "OptionalLayer", "OCGName"), (std::vector<std::string>{"Die", "Die", "Crease"}));
+    EXPECT_EQ(attributeValues(text, "ContentObject", "SepNameOff")[0], "Die,Die,Crease");
+    EXPECT_EQ(attributeValues(text, "Surface", "dieSepInternalNames")[0], "Die,Die,Crease");
+    EXPECT_NE(text.find("name=\"KAVDieLibrary\""), std::string::npos);
+    EXPECT_EQ(attributeValues(text, "Surface", "index").size(), 6u);  // five pages and the die cut
+
+    std::filesystem::remove(out);
+    std::string none = makePdf(dir, {"Gold"}, "", "none.pdf");
+    EXPECT_EQ(scanPdfInksToDescription(none.c_str(), out.data(), true), 2);
+    EXPECT_FALSE(std::filesystem::exists(out));
+}
+
+TEST(XmpScan, DieLibraryModeWithoutUsableLibrary) {
+    TempDir dir;
+    std::string pdf = makePdf(dir, {"Die"}, "");
+    std::string out = (dir / "die.impinfo").string();
+    {
+        DieLibraryHome home("<AutoDieLibrary><Separations><Separation Name=\"Die\">");  // not well-formed
+        EXPECT_EQ(scanPdfInksToDescription(pdf.c_str(), out.data(), true), 2);
+    }
+    {
+        DieLibraryHome home("<OtherRoot><Separations><Separation Name=\"Die\"/></Separations></OtherRoot>");
+        EXPECT_EQ(scanPdfInksToDescription(pdf.c_str(), out.data(), true), 2);
+    }
+    EXPECT_FALSE(std::filesystem::exists(out));
+}
+
+TEST(DieLibrary, EntriesAndFlags) {
+    std::vector<DieLibraryEntry> entries;
+    ASSERT_TRUE(parseDieLibrary(kLibrary, entries));
+    ASSERT_EQ(entries.size(), 3u);
+    EXPECT_EQ(entries[0].kind, 0);
+    EXPECT_TRUE(entries[1].locked);
+    EXPECT_TRUE(entries[1].printable);
+    EXPECT_FALSE(entries[2].printable);
+    EXPECT_TRUE(isDieSeparation(entries, "Die"));
+    EXPECT_FALSE(isDieSeparation(entries, "die"));
+    EXPECT_FALSE(isDieSeparation(entries, "LayerDie"));
+}
