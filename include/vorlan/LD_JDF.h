@@ -24,6 +24,8 @@ class JDFNode;
 class JDFLayout;
 class JDFRunList;
 class JDFMedia;
+class JDFResource;
+class WString;
 }  // namespace JDF
 
 struct LD_JDFHandles;        // the parsed ticket's handles (parser, nodes, resources)
@@ -134,6 +136,61 @@ public:
     LD_Signature* JDF_GetSignaturesInLayoutByIndex(long index);
     LD_Range* JDF_GetRangeOfSheetsPerSignature(long index);
 
+    // The ticket's nodes (types 0 root, 1 process node, 2 Layout, 3 InterpretingParams).
+    LD_Status JDF_GetStatusOfNodeByType(JDFNode_Types type);
+    LD_Activation JDF_GetActivationOfProcessByType(JDFNode_Types type);
+    // Texts stay valid until the next such query or the worker's destruction.
+    wchar_t* JDF_GetIDofProcessByType(JDFNode_Types type);
+    wchar_t* JDF_GetJDFVersion();
+    std::vector<wchar_t*> JDF_GetICSVersions();
+    static uint64_t Debug_GetCurrTimeStampInMilliSeconds();
+    LDError Debug_TestVector(JDF::vElement& elements);
+    LDError Debug_TestElement(JDF::KElement& element, char flags);
+
+    // ---- Ticket reader: process nodes, resources, run lists, layout ---------------------------
+    int FindImpositionNode(JDF::JDFNode& root, JDF::JDFNode& out);
+    int IncludesType(const JDF::JDFNode& node, const char* type);
+    bool isProcessUsageMarks(const JDF::JDFResource& resource);
+    bool isProcessUsageDocument(const JDF::JDFResource& resource);
+    int isPDFPresent(std::vector<LD_PDF*>& pdfs, LD_PDF* pdf);
+    void parseMediaNode(const JDF::JDFMedia& media, LD_OCG_Media* record);
+    // Layout injection for tickets without a Layout, and the automated-layout test.
+    bool injectLayoutNode(const JDF::JDFNode& node, JDF::JDFLayout& layout);
+    bool parseRunList(const JDF::JDFRunList& runList, JDF::JDFLayout& signature, int& pageCounter,
+                      const JDF::JDFMedia& media);
+    bool CheckForLayoutNodeAutomatedTrue(const JDF::JDFNode& node);
+
+    // ---- Geometry and clip-path strings -------------------------------------------------------
+    static std::vector<double>* splitIntoFloatTokensBySpace(const JDF::WString& text);  // caller deletes
+    static void parseStringAsPoints(const JDF::WString& text, std::vector<LD_Point*>& points);
+    static void parseStringAsBox(const JDF::WString& text, LD_Box* box);
+    static void parseStringAsCTM(const JDF::WString& text, LD_CTM* ctm);
+    // False when an operator had the wrong count of numbers; that operator is left out.
+    static bool parseStringAsClipPathOperations(const JDF::WString& text, std::vector<LD_ClipPathOperations*>& ops);
+    static bool isMarkPresent(const wchar_t* text);
+
+    // ---- Ordinal table --------------------------------------------------------------------------
+    void constructOrdinalTable();
+    int32_t updateAndAppendToOrdinalTable(LD_Run* run, LD_OCG_InterpretingParams* params);
+    int32_t updateAndInsertToOrdinalTable(LD_Run* run, LD_OCG_InterpretingParams* params, int32_t position);
+    LD_OrdinalTableElement* searchOrdinalTableForRunIPPair(LD_Run* run, LD_OCG_InterpretingParams* params,
+                                                           int32_t page);
+    bool areRunsEqual(LD_Run* a, LD_Run* b);
+    bool areInterpretingParamsEqual(LD_OCG_InterpretingParams* a, LD_OCG_InterpretingParams* b);
+    int32_t getNewContentTableElementPosition();
+    LD_OrdinalTableElement* getOrdinalElementByOrdNum(int32_t ordinal);
+    void setOrdinalElementByOrdNum(int32_t ordinal, LD_OrdinalTableElement* row);
+    LD_Run* getRunByOrdNumber(int32_t ordinal);
+    LD_Run* getMarkRunByOrdNumber(int32_t ordinal);
+    LD_OCG_InterpretingParams* getInterpretingParamsByOrdNumber(int32_t ordinal);
+    LD_OCG_InterpretingParams* getInterpretingParamsByRunNumber(int32_t runNumber);
+    int32_t getOrdNumberFromContentObjectIndex(int32_t contentObjectIndex);
+    void setOrdNumberFromContentObjectIndex(int32_t contentObjectIndex, int32_t ordinal);
+    void updateOrdInLayout(int32_t contentObjectIndex, int32_t ordinal);
+    LDError copyRunlist(std::vector<LD_Run*>& source, std::vector<LD_Run*>& destination);
+    int32_t stringVecContains(std::vector<wchar_t*>& list, const wchar_t* text);
+    void copyOCGVec(std::vector<wchar_t*>& destination, std::vector<wchar_t*>& source);
+
     // ---- Record release (each owner list has one) ---------------------------------------------
     void releaseLayout();
     void releaseOrdinalTable();
@@ -144,6 +201,9 @@ public:
     void releaseSurfaceVersions();
     void releaseDieCuts();
     void releaseLayerData();
+    // The job's records in the pipeline's release order: layout, ordinal table, PDFs, runs,
+    // versions, die cuts, content-object ordinal map.
+    void releaseJobRecords();
     void releaseAllRecords();  // everything any list still owns
 
     // ---- Members ----------------------------------------------------------------------------------

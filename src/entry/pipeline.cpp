@@ -200,15 +200,7 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
     if (LDError written = writeJDF(outputJdfPath); written != LD_OK) return exitWith(written);
 
     // 17. Release the model.
-    releaseLayout();
-    releaseOrdinalTable();
-    releasePDFs(contentPDFs);
-    releasePDFs(markPDFs);
-    releaseRuns(contentRuns);
-    releaseRuns(markRuns);
-    releaseVersions();
-    releaseDieCuts();
-    contentObjectOrdinalMap.clear();
+    releaseJobRecords();
     if (ticketDataPath != dataPath) std::free(ticketDataPath);
     ticketDataPath = nullptr;
     std::free(jdfPath);

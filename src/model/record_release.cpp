@@ -59,7 +59,7 @@ void LD_JDF::releaseLayerData() {
     }
 }
 
-void LD_JDF::releaseAllRecords() {
+void LD_JDF::releaseJobRecords() {
     releaseLayout();
     releaseOrdinalTable();
     releasePDFs(contentPDFs);
@@ -69,6 +69,10 @@ void LD_JDF::releaseAllRecords() {
     releaseVersions();
     releaseDieCuts();
     contentObjectOrdinalMap.clear();
+}
+
+void LD_JDF::releaseAllRecords() {
+    releaseJobRecords();
     releaseInterpretingParams();
     releaseSurfaceVersions();
     releaseLayerData();
