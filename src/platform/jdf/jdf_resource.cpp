@@ -197,6 +197,8 @@ JDFResource JDFResourcePool::AppendResource(const WString& name, const WString& 
     r.KElement::SetAttribute(L"Status", L"Unavailable");
     WString cls = resourceClass.empty() ? ResourceClassOf(name) : resourceClass;
     if (!cls.empty()) r.KElement::SetAttribute(L"Class", cls);
+    // The schema requires ComponentType; what a print process makes is sheets.
+    if (name == L"Component") r.KElement::SetAttribute(L"ComponentType", L"Sheet");
     return r;
 }
 

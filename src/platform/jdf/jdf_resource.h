@@ -94,7 +94,8 @@ public:
     // The index-th resource of that name; null when absent.
     JDFResource GetResource(const WString& name, int index = 0, const WString& nameSpaceURI = L"") const;
     // Appends a new resource: ID "r…", Status "Unavailable", and Class (the given one, or the
-    // known class of that resource name when empty).
+    // known class of that resource name when empty). A Component also gets the ComponentType
+    // "Sheet" that the schema requires.
     JDFResource AppendResource(const WString& name, const WString& resourceClass = L"",
                                const WString& nameSpaceURI = L"");
     // Appends a deep copy of a resource (from any document). The copy keeps its ID unless the ID
