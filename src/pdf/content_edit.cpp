@@ -1,0 +1,227 @@
+// Byte-slice editing of parsed content.
+#include "pdf/content_edit.h"
+
+#include <qpdf/QPDFPageObjectHelper.hh>
+
+#include <algorithm>
+
+namespace vorlan::pdf {
+namespace {
+
+constexpr int kMaxColourSpaceDepth = 8;
+
+bool runHasBarrier(const ContentElement* first, const ContentElement* last) {
+    for (const ContentElement* e = first; e <= last; ++e)
+        if (e->kind == ElementKind::Barrier) return true;
+    return false;
+}
+
+// The sibling list holding both elements, or null.
+const std::vector<ContentElement>* siblingsOf(const std::vector<ContentElement>& list,
+                                              const ContentElement* first, const ContentElement* last) {
+    if (!list.empty() && first >= list.data() && last < list.data() + list.size()) return &list;
+    for (const ContentElement& e : list) {
+        if (const auto* found = siblingsOf(e.children, first, last)) return found;
+    }
+    return nullptr;
+}
+
+void markImagesOptional(const ContentElement& e, QPDFObjectHandle ocg) {
+    QPDFObjectHandle image = e.object;  // a handle copy: qpdf's accessors are not const
+    if (e.kind == ElementKind::Image && image.isStream()) image.getDict().replaceKey("/OC", ocg);
+    for (const ContentElement& c : e.children) markImagesOptional(c, ocg);
+}
+
+QPDFObjectHandle renamed(QPDFObjectHandle name, const std::function<bool(const std::string&)>& affected,
+                         bool& changed) {
+    if (name.isName() && name.getName().size() > 1 && affected(name.getName().substr(1))) {
+        changed = true;
+        return QPDFObjectHandle::newName("/None");
+    }
+    return name;
+}
+
+QPDFObjectHandle rewriteSpace(QPDFObjectHandle cs, const std::function<bool(const std::string&)>& affected,
+                              int depth) {
+    if (depth > kMaxColourSpaceDepth || !cs.isArray() || cs.getArrayNItems() < 2) return cs;
+    std::vector<QPDFObjectHandle> items = cs.getArrayAsVector();
+    const std::string family = items[0].isName() ? items[0].getName() : "";
+    bool changed = false;
+    if (family == "/Separation") {
+        items[1] = renamed(items[1], affected, changed);
+    } else if (family == "/DeviceN") {
+        if (items[1].isArray()) {
+            std::vector<QPDFObjectHandle> names = items[1].getArrayAsVector();
+            for (auto& n : names) n = renamed(n, affected, changed);
+            if (changed) items[1] = QPDFObjectHandle::newArray(names);
+        }
+        if (items.size() >= 5 && items[4].isDictionary()) {
+            QPDFObjectHandle colorants = items[4].getKey("/Colorants");
+            if (colorants.isDictionary()) {
+                QPDFObjectHandle newColorants = QPDFObjectHandle::newDictionary();
+                bool colorantsChanged = false;
+                for (const std::string& key : colorants.getKeys()) {
+                    QPDFObjectHandle space = colorants.getKey(key);
+                    if (key.size() > 1 && affected(key.substr(1))) {
+                        newColorants.replaceKey("/None", rewriteSpace(space, affected, depth + 1));
+                        colorantsChanged = true;
+                    } else {
+                        newColorants.replaceKey(key, space);
+                    }
+                }
+                if (colorantsChanged) {
+                    QPDFObjectHandle attributes = items[4].shallowCopy();
+                    attributes.replaceKey("/Colorants", newColorants);
+                    items[4] = attributes;
+                    changed = true;
+                }
+            }
+        }
+    } else if (family == "/Indexed" || family == "/I" || family == "/Pattern") {
+        QPDFObjectHandle base = rewriteSpace(items[1], affected, depth + 1);
+        if (!base.isSameObjectAs(items[1])) {
+            items[1] = base;
+            changed = true;
+        }
+    }
+    return changed ? QPDFObjectHandle::newArray(items) : cs;
+}
+
+}  // namespace
+
+QPDFObjectHandle colorantsToNone(QPDFObjectHandle colourSpace,
+                                 const std::function<bool(const std::string&)>& affected) {
+    return rewriteSpace(colourSpace, affected, 0);
+}
+
+void ContentEditor::replace(size_t begin, size_t end, std::string text) {
+    edits_.push_back({begin, end, std::move(text), 2, static_cast<int>(edits_.size())});
+}
+
+void ContentEditor::insert(size_t at, std::string text, bool closing) {
+    edits_.push_back({at, at, std::move(text), closing ? 0 : 1, static_cast<int>(edits_.size())});
+}
+
+QPDFObjectHandle ContentEditor::ownResources() {
+    QPDFObjectHandle owner = content_.owner;
+    QPDFObjectHandle resources;
+    if (owner.isStream()) {  // a form: its own dictionary, made when missing
+        resources = owner.getDict().getKey("/Resources");
+        if (!resources.isDictionary()) {
+            resources = content_.resources.isDictionary() ? content_.resources.shallowCopy()
+                                                          : QPDFObjectHandle::newDictionary();
+            owner.getDict().replaceKey("/Resources", resources);
+        }
+    } else {
+        // A page: inherited resources are copied onto the page before they change.
+        resources = QPDFPageObjectHelper(owner).getAttribute("/Resources", true);
+        if (!resources.isDictionary()) {
+            resources = QPDFObjectHandle::newDictionary();
+            owner.replaceKey("/Resources", resources);
+        }
+    }
+    content_.resources = resources;
+    return resources;
+}
+
+std::string ContentEditor::propertyName(QPDFObjectHandle ocg) {
+    auto known = ocgNames_.find(ocg.getObjGen());
+    if (known != ocgNames_.end()) return known->second;
+    QPDFObjectHandle resources = ownResources();
+    QPDFObjectHandle properties = resources.getKey("/Properties");
+    if (!properties.isDictionary()) {
+        properties = QPDFObjectHandle::newDictionary();
+        resources.replaceKey("/Properties", properties);
+    } else if (properties.isIndirect()) {  // may be shared with other pages: add to a copy
+        properties = properties.shallowCopy();
+        resources.replaceKey("/Properties", properties);
+    }
+    std::string name;
+    for (const std::string& key : properties.getKeys())
+        if (properties.getKey(key).isSameObjectAs(ocg)) name = key;
+    for (int n = 1; name.empty(); ++n)
+        if (!properties.hasKey("/oc" + std::to_string(n))) name = "/oc" + std::to_string(n);
+    properties.replaceKey(name, ocg);
+    ocgNames_[ocg.getObjGen()] = name;
+    return name;
+}
+
+bool ContentEditor::wrapInOptionalContent(const ContentElement& first, const ContentElement& last,
+                                          QPDFObjectHandle ocg) {
+    const auto* siblings = siblingsOf(content_.elements, &first, &last);
+    if (!siblings || &first > &last || runHasBarrier(&first, &last)) return false;
+    const std::string name = propertyName(ocg);
+    insert(first.begin, "/OC " + name + " BDC\n", false);
+    insert(last.end, "\nEMC\n", true);
+    for (const ContentElement* e = &first; e <= &last; ++e) markImagesOptional(*e, ocg);
+    return true;
+}
+
+void ContentEditor::remove(const ContentElement& e) {
+    switch (e.kind) {
+        case ElementKind::Path:
+            if (e.fills || e.strokes) replace(e.opBegin, e.opEnd, "n");
+            break;
+        case ElementKind::TextRun:
+            if (e.fills || e.strokes) {
+                insert(e.begin, "3 Tr ", false);
+                insert(e.end, " " + std::to_string(e.state.textRender) + " Tr", true);
+            }
+            break;
+        case ElementKind::Image:
+        case ElementKind::InlineImage:
+        case ElementKind::Shading:
+        case ElementKind::Form:
+            replace(e.begin, e.end, "");
+            break;
+        default:
+            for (const ContentElement& child : e.children) remove(child);
+            break;
+    }
+}
+
+std::string ContentEditor::result() const {
+    std::vector<const Edit*> ordered;
+    for (const Edit& e : edits_) ordered.push_back(&e);
+    std::stable_sort(ordered.begin(), ordered.end(), [](const Edit* a, const Edit* b) {
+        if (a->begin != b->begin) return a->begin < b->begin;
+        if (a->rank != b->rank) return a->rank < b->rank;
+        return a->order < b->order;
+    });
+    const std::string& src = content_.bytes;
+    std::string out;
+    out.reserve(src.size() + 64 * edits_.size());
+    size_t at = 0;
+    for (const Edit* e : ordered) {
+        const size_t begin = std::min(e->begin, src.size());
+        if (begin < at) continue;  // overlaps an earlier replacement: skipped
+        out.append(src, at, begin - at);
+        out += e->text;
+        at = std::max(begin, std::min(e->end, src.size()));
+    }
+    out.append(src, at, std::string::npos);
+    return out;
+}
+
+void ContentEditor::apply(QPDF& pdf) {
+    if (edits_.empty()) return;
+    std::string bytes = result();
+    if (content_.owner.isStream()) {
+        content_.owner.replaceStreamData(bytes, QPDFObjectHandle::newNull(), QPDFObjectHandle::newNull());
+    } else {
+        content_.owner.replaceKey("/Contents", QPDFObjectHandle::newStream(&pdf, bytes));
+    }
+    content_.bytes = std::move(bytes);
+    edits_.clear();
+}
+
+QPDFObjectHandle FormCopies::copyFor(QPDFObjectHandle form, const std::string& variant) {
+    auto key = std::make_pair(form.getObjGen(), variant);
+    auto it = copies_.find(key);
+    if (it != copies_.end()) return it->second;
+    QPDFObjectHandle copy = pdf_.makeIndirectObject(form.copyStream());
+    copies_.emplace(key, copy);
+    return copy;
+}
+
+}  // namespace vorlan::pdf

@@ -1,0 +1,249 @@
+// Building the element tree from the content walker's steps.
+#include "pdf/content_tree.h"
+
+#include <qpdf/Pl_Buffer.hh>
+#include <qpdf/QPDFPageObjectHelper.hh>
+
+#include <exception>
+#include <set>
+
+namespace vorlan::pdf {
+namespace {
+
+constexpr int kMaxFormDepth = 16;
+
+ElementKind containerKind(StepKind kind) {
+    switch (kind) {
+        case StepKind::GroupBegin: return ElementKind::Group;
+        case StepKind::TextBegin: return ElementKind::TextObject;
+        default: return ElementKind::MarkedContent;
+    }
+}
+
+class TreeBuilder : public ContentWalker {
+public:
+    TreeBuilder(Content& content, ColourSpaceResolver::SharedCache* cache, GraphicsState start,
+                std::set<QPDFObjGen>& openForms, int depth)
+        : ContentWalker(content.resources, cache, std::move(start)),
+          content_(content), cache_(cache), openForms_(openForms), depth_(depth) {
+        open_.emplace_back();  // the content itself
+    }
+
+    void finish() {
+        flushPath();
+        while (open_.size() > 1) {
+            open_.back().closed = false;
+            closeTop(open_.back().end);
+        }
+        content_.elements = std::move(open_.front().children);
+    }
+
+protected:
+    void handleStep(const Step& step) override {
+        switch (step.kind) {
+            case StepKind::PathPart:
+                if (!inPath_) {
+                    path_ = leaf(ElementKind::Path, step);
+                    inPath_ = true;
+                }
+                path_.end = step.end;
+                return;
+            case StepKind::PathPaint: {
+                ContentElement e = inPath_ ? std::move(path_) : leaf(ElementKind::Path, step);
+                inPath_ = false;
+                setPaint(e, step);
+                add(std::move(e));
+                return;
+            }
+            default:
+                break;
+        }
+        flushPath();
+        switch (step.kind) {
+            case StepKind::GroupBegin:
+            case StepKind::TextBegin:
+            case StepKind::MarkedBegin: {
+                ContentElement c = leaf(containerKind(step.kind), step);
+                c.name = step.name;
+                c.object = step.object;
+                c.optionalContent = step.optionalContent;
+                open_.push_back(std::move(c));
+                return;
+            }
+            case StepKind::GroupEnd:
+                closeOrBarrier(ElementKind::Group, step);
+                return;
+            case StepKind::TextEnd:
+                closeOrBarrier(ElementKind::TextObject, step);
+                return;
+            case StepKind::MarkedEnd:
+                closeOrBarrier(ElementKind::MarkedContent, step);
+                return;
+            case StepKind::TextShow:
+                addPainting(ElementKind::TextRun, step);
+                return;
+            case StepKind::Image:
+                addPainting(ElementKind::Image, step);
+                return;
+            case StepKind::InlineImage:
+                addPainting(ElementKind::InlineImage, step);
+                return;
+            case StepKind::Shading:
+                addPainting(ElementKind::Shading, step);
+                return;
+            case StepKind::Form: {
+                ContentElement e = leaf(ElementKind::Form, step);
+                setPaint(e, step);
+                if (depth_ < kMaxFormDepth && openForms_.insert(step.object.getObjGen()).second) {
+                    e.form = parse(step.object, state());
+                    openForms_.erase(step.object.getObjGen());
+                }
+                add(std::move(e));
+                return;
+            }
+            default:  // inline image parts before EI are part of the inline image
+                if (step.op == "BI" || step.op == "ID") return;
+                add(leaf(ElementKind::State, step));
+                return;
+        }
+    }
+
+private:
+    ContentElement leaf(ElementKind kind, const Step& step) const {
+        ContentElement e;
+        e.kind = kind;
+        e.begin = step.begin;
+        e.end = step.end;
+        e.opBegin = step.opBegin;
+        e.opEnd = step.end;
+        e.op = step.op;
+        e.state = state();
+        return e;
+    }
+
+    static void setPaint(ContentElement& e, const Step& step) {
+        e.end = step.end;
+        e.opBegin = step.opBegin;
+        e.opEnd = step.end;
+        e.op = step.op;
+        e.fills = step.fills;
+        e.strokes = step.strokes;
+        e.ownSpace = step.ownSpace;
+        e.imageMask = step.imageMask;
+        e.name = step.name;
+        e.object = step.object;
+        e.optionalContent = step.optionalContent;
+    }
+
+    void addPainting(ElementKind kind, const Step& step) {
+        ContentElement e = leaf(kind, step);
+        setPaint(e, step);
+        add(std::move(e));
+    }
+
+    void add(ContentElement e) {
+        open_.back().end = e.end;
+        open_.back().children.push_back(std::move(e));
+    }
+
+    void flushPath() {  // a path interrupted by another operator stays unpainted
+        if (!inPath_) return;
+        inPath_ = false;
+        add(std::move(path_));
+    }
+
+    void closeTop(size_t end) {
+        ContentElement c = std::move(open_.back());
+        open_.pop_back();
+        c.end = end;
+        add(std::move(c));
+    }
+
+    void closeOrBarrier(ElementKind kind, const Step& step) {
+        if (open_.size() > 1 && open_.back().kind == kind) {
+            closeTop(step.end);
+        } else {
+            add(leaf(ElementKind::Barrier, step));
+        }
+    }
+
+    std::shared_ptr<Content> parse(QPDFObjectHandle form, const GraphicsState& start);
+
+    Content& content_;
+    ColourSpaceResolver::SharedCache* cache_;
+    std::set<QPDFObjGen>& openForms_;
+    int depth_;
+    std::vector<ContentElement> open_;
+    ContentElement path_;
+    bool inPath_ = false;
+};
+
+std::string pipedBytes(QPDFObjectHandle owner) {
+    Pl_Buffer buffer("content");
+    QPDFPageObjectHelper(owner).pipeContents(&buffer);
+    std::unique_ptr<Buffer> data(buffer.getBuffer());
+    return std::string(reinterpret_cast<const char*>(data->getBuffer()), data->getSize());
+}
+
+std::shared_ptr<Content> build(QPDFObjectHandle owner, QPDFObjectHandle resources, bool isPage,
+                               const GraphicsState& start, ColourSpaceResolver::SharedCache* cache,
+                               std::set<QPDFObjGen>& openForms, int depth) {
+    auto content = std::make_shared<Content>();
+    content->owner = owner;
+    content->resources = resources;
+    try {
+        content->bytes = pipedBytes(owner);
+    } catch (const std::exception&) {
+        content->complete = false;
+        return content;
+    }
+    TreeBuilder builder(*content, cache, start, openForms, depth);
+    content->complete = isPage ? builder.walkPage(owner) : builder.walkStream(owner);
+    builder.finish();
+    return content;
+}
+
+std::shared_ptr<Content> TreeBuilder::parse(QPDFObjectHandle form, const GraphicsState& start) {
+    return build(form, streamResources(form, resources()), false, start, cache_, openForms_, depth_ + 1);
+}
+
+}  // namespace
+
+bool ContentElement::paints() const {
+    switch (kind) {
+        case ElementKind::Path:
+        case ElementKind::TextRun: return fills || strokes;
+        case ElementKind::Image:
+        case ElementKind::InlineImage:
+        case ElementKind::Shading:
+        case ElementKind::Form: return true;
+        default: return false;
+    }
+}
+
+std::vector<ColourSpaceRef> ContentElement::colourSpaces() const {
+    std::vector<ColourSpaceRef> spaces;
+    if (fills && state.fill) spaces.push_back(state.fill);
+    if (strokes && state.stroke) spaces.push_back(state.stroke);
+    if (ownSpace) spaces.push_back(ownSpace);
+    return spaces;
+}
+
+std::shared_ptr<Content> parsePageContent(QPDFObjectHandle page, ColourSpaceResolver::SharedCache* cache) {
+    std::set<QPDFObjGen> openForms;
+    QPDFObjectHandle resources;
+    try {
+        resources = QPDFPageObjectHelper(page).getAttribute("/Resources", false);
+    } catch (const std::exception&) {
+        resources = QPDFObjectHandle::newNull();
+    }
+    return build(page, resources, true, GraphicsState::initial(), cache, openForms, 0);
+}
+
+std::shared_ptr<Content> parseFormContent(QPDFObjectHandle form, QPDFObjectHandle parentResources,
+                                          const GraphicsState& start, ColourSpaceResolver::SharedCache* cache) {
+    std::set<QPDFObjGen> openForms{form.getObjGen()};
+    return build(form, streamResources(form, parentResources), false, start, cache, openForms, 0);
+}
+
+}  // namespace vorlan::pdf

@@ -1,0 +1,76 @@
+// Page and form content as a tree of elements, for the edits of conversion and separation
+// rewriting: containers (q..Q groups, BT..ET text objects, BMC/BDC..EMC marked content, form
+// XObjects) and leaves (paths, text runs, images, inline images, shadings), each painting leaf with
+// the graphics state at its painting operator.
+//
+// The element kinds of the original content-editing layer map onto these kinds: content (0) is a
+// Content; text (1) a TextObject with its TextRun children; image (3) an Image or InlineImage;
+// form (4) a Form; marked-content container (12) a MarkedContent; group (17) a Group; element types
+// 16 and 23 (shadings with their own colour space) a Shading; paths and the like a Path. State
+// leaves hold the operators that only change state; Barrier leaves hold operators that close
+// something that is not open (an unmatched Q, EMC or ET) and are never moved or wrapped.
+#pragma once
+
+#include <qpdf/QPDFObjectHandle.hh>
+
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "pdf/colour_space.h"
+#include "pdf/content_walker.h"
+
+namespace vorlan::pdf {
+
+enum class ElementKind {
+    Path, TextObject, TextRun, Image, InlineImage, Form, Shading, Group, MarkedContent, State, Barrier
+};
+
+struct Content;
+
+struct ContentElement {
+    ElementKind kind = ElementKind::State;
+    size_t begin = 0;       // first byte (first operand of the first operator)
+    size_t end = 0;         // one past the last operator (the closing one for containers)
+    size_t opBegin = 0;     // the painting operator of a leaf; the opening operator of a container
+    size_t opEnd = 0;
+    std::string op;         // that operator
+    GraphicsState state;    // at that operator
+    bool fills = false;     // paints with the fill colour
+    bool strokes = false;   // paints with the stroke colour
+    ColourSpaceRef ownSpace;  // images and shadings
+    bool imageMask = false;
+    std::string name;       // XObject or shading resource name, marked-content tag
+    QPDFObjectHandle object;  // XObject, shading, marked-content properties, inline image dictionary
+    bool optionalContent = false;  // marked content /OC, or an XObject with its own /OC
+    bool closed = true;     // containers: the closing operator was found
+    std::vector<ContentElement> children;  // containers
+    std::shared_ptr<Content> form;         // Form: its content, parsed with the state at this use
+
+    bool isContainer() const {
+        return kind == ElementKind::TextObject || kind == ElementKind::Group ||
+               kind == ElementKind::MarkedContent;
+    }
+    // True for leaves that put marks on the page (a path painted with n, or invisible text, do not).
+    bool paints() const;
+    // The colour spaces a painting leaf uses, in the order fill, stroke, own.
+    std::vector<ColourSpaceRef> colourSpaces() const;
+};
+
+struct Content {
+    QPDFObjectHandle owner;      // the page, or the form XObject
+    QPDFObjectHandle resources;  // what names resolve against
+    std::string bytes;           // the decoded content the offsets point into
+    std::vector<ContentElement> elements;
+    bool complete = true;        // parsed to its end without damage
+};
+
+// Parses a page's content (all its streams as one). Forms are parsed at each use, with the state
+// at the use, nested up to a fixed depth; a form that (indirectly) uses itself is not entered
+// again. Never throws; damaged content yields the elements before the damage and complete=false.
+std::shared_ptr<Content> parsePageContent(QPDFObjectHandle page, ColourSpaceResolver::SharedCache* cache);
+// Parses a form XObject's content with the given starting state.
+std::shared_ptr<Content> parseFormContent(QPDFObjectHandle form, QPDFObjectHandle parentResources,
+                                          const GraphicsState& start, ColourSpaceResolver::SharedCache* cache);
+
+}  // namespace vorlan::pdf
