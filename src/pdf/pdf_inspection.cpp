@@ -3,6 +3,7 @@
 
 #include <qpdf/QPDFPageObjectHelper.hh>
 
+#include <algorithm>
 #include <cmath>
 #include <cstdio>
 #include <cstring>
@@ -18,12 +19,18 @@ void reportUnopenable(const char* path) {
     std::fprintf(stderr, "Unable to open %s\n", path ? path : "");
 }
 
-// Width and height of a box as shown after turning it by `rotate` degrees (0, 90, 180, 270;
-// other values leave it as it is). Both 0 for something that is not a rectangle.
-void shownSize(QPDFObjectHandle box, int rotate, double& width, double& height) {
-    width = height = 0;
-    if (!box.isRectangle()) return;
-    QPDFObjectHandle::Rectangle r = box.getArrayAsRectangle();
+// A box as a rectangle with ordered corners; false for something that is not a rectangle.
+bool rectangleOf(QPDFObjectHandle box, QPDFObjectHandle::Rectangle& r) {
+    if (!box.isRectangle()) return false;
+    QPDFObjectHandle::Rectangle raw = box.getArrayAsRectangle();
+    r = QPDFObjectHandle::Rectangle(std::min(raw.llx, raw.urx), std::min(raw.lly, raw.ury),
+                                    std::max(raw.llx, raw.urx), std::max(raw.lly, raw.ury));
+    return std::isfinite(r.llx) && std::isfinite(r.lly) && std::isfinite(r.urx) && std::isfinite(r.ury);
+}
+
+// Width and height of a rectangle as shown after turning it by `rotate` degrees (0, 90, 180,
+// 270; other values leave it as it is).
+void shownSize(const QPDFObjectHandle::Rectangle& r, int rotate, double& width, double& height) {
     // (left, top, right, bottom), turned as a page turns.
     double left = r.llx, top = r.ury, right = r.urx, bottom = r.lly;
     double l = left, t = top, rt = right, b = bottom;
@@ -35,7 +42,28 @@ void shownSize(QPDFObjectHandle box, int rotate, double& width, double& height) 
     }
     width = std::fabs(l - rt);
     height = std::fabs(t - b);
-    if (!std::isfinite(width) || !std::isfinite(height)) width = height = 0;
+}
+
+void shownSize(QPDFObjectHandle box, int rotate, double& width, double& height) {
+    width = height = 0;
+    QPDFObjectHandle::Rectangle r;
+    if (rectangleOf(box, r)) shownSize(r, rotate, width, height);
+}
+
+// The crop box as it takes effect: clipped to the media box (a crop box reaching beyond the
+// medium shows nothing more). An empty overlap gives an empty box.
+void shownCropSize(QPDFPageObjectHelper& page, int rotate, double& width, double& height) {
+    width = height = 0;
+    QPDFObjectHandle::Rectangle crop, media;
+    if (!rectangleOf(page.getCropBox(), crop)) return;
+    if (rectangleOf(page.getMediaBox(), media)) {
+        crop.llx = std::max(crop.llx, media.llx);
+        crop.lly = std::max(crop.lly, media.lly);
+        crop.urx = std::min(crop.urx, media.urx);
+        crop.ury = std::min(crop.ury, media.ury);
+        if (crop.urx < crop.llx || crop.ury < crop.lly) return;
+    }
+    shownSize(crop, rotate, width, height);
 }
 
 double floorTo4(double value) { return std::floor(value * 10000.0) / 10000.0; }
@@ -72,7 +100,7 @@ void getFirstPageSize(ZippedJDFFileSystem* fs, const char* path, double* height,
         rotate %= 360;
         if (rotate < 0) rotate += 360;
         double w = 0, h = 0;
-        shownSize(page.getCropBox(), static_cast<int>(rotate), w, h);
+        shownCropSize(page, static_cast<int>(rotate), w, h);
         if (w <= 0 && h <= 0) shownSize(page.getMediaBox(), static_cast<int>(rotate), w, h);
         if (w <= 0 && h <= 0) shownSize(page.getAttribute("/TrimBox", false), static_cast<int>(rotate), w, h);
         if (height) *height = floorTo4(h);

@@ -69,6 +69,10 @@ TEST(PdfInspection, FirstPageSizeFollowsRotationAndBoxes) {
     cropped.cropBox = "[110 60 10 10]";  // corners in any order
     EXPECT_EQ(firstPageSize(onePage(dir, cropped, "crop.pdf")), std::make_pair(50.0, 100.0));
 
+    TestPdf::PageOptions beyond;  // a crop box reaching past the media box is clipped to it
+    beyond.cropBox = "[-20 -20 150 1000]";
+    EXPECT_EQ(firstPageSize(onePage(dir, beyond, "beyond.pdf")), std::make_pair(100.0, 150.0));
+
     TestPdf::PageOptions emptyCrop;
     emptyCrop.cropBox = "[0 0 0 0]";
     EXPECT_EQ(firstPageSize(onePage(dir, emptyCrop, "emptycrop.pdf")), std::make_pair(100.0, 200.0));
