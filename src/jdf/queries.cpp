@@ -1,4 +1,5 @@
 // Views into the job model for hosts that use the exported classes.
+#include <cstdint>
 #include <stdexcept>
 
 #include "vorlan/LD_JDF.h"
@@ -48,16 +49,17 @@ std::vector<LD_AuditData*>* LD_JDF::JDF_GetAuditPool() { return &auditPool; }
 
 long LD_JDF::JDF_GetMaxOrdinalNumber() { return static_cast<long>(m_OrdinalTable.size()) - 1; }
 
+// Ordinals outside the 32-bit range name no row.
 LD_ContentTableElement* LD_JDF::JDF_GetLogicalContentPageByOrdinalNumber(long ordinal) {
-    for (LD_OrdinalTableElement* row : m_OrdinalTable)
-        if (row->ordinal == ordinal) return row->content;
-    return nullptr;
+    if (ordinal < INT32_MIN || ordinal > INT32_MAX) return nullptr;
+    LD_OrdinalTableElement* row = getOrdinalElementByOrdNum(static_cast<int32_t>(ordinal));
+    return row ? row->content : nullptr;
 }
 
 LD_MarkTableElement* LD_JDF::JDF_GetLogicalMarkPageByOrdinalNumber(long ordinal) {
-    for (LD_OrdinalTableElement* row : m_OrdinalTable)
-        if (row->ordinal == ordinal) return row->mark;
-    return nullptr;
+    if (ordinal < INT32_MIN || ordinal > INT32_MAX) return nullptr;
+    LD_OrdinalTableElement* row = getOrdinalElementByOrdNum(static_cast<int32_t>(ordinal));
+    return row ? row->mark : nullptr;
 }
 
 long LD_JDF::JDF_GetNumberOfLogicalDocs() { return numberOfLogicalDocs; }

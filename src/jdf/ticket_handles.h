@@ -2,7 +2,10 @@
 #pragma once
 
 #include <memory>
+#include <string>
+#include <vector>
 
+#include "jdf/model_indexes.h"
 #include "platform/jdf/jdf.h"
 
 struct LD_JDFHandles {
@@ -14,6 +17,14 @@ struct LD_JDFHandles {
     JDF::KElement renderingParamsElement;
     JDF::KElement digitalPrintingParamsElement;
     JDF::KElement runListElement;
+
+    // Look-up indexes over the model's lists; rebuilt on demand, so copies may share nothing.
+    vorlan::jdf::ModelIndexes indexes;
+    // Texts handed out by the node queries; valid until the next such query.
+    std::vector<std::wstring> queryTexts;
+    // Surfaces a later surface of the same side pushed out of their sheet's slot: they stay in
+    // the surface list, and are owned here (the sheet owns only its front and back).
+    std::vector<std::unique_ptr<LD_Surface>> displacedSurfaces;
 
     LD_JDFHandles() = default;
     // Copies share the document; the parser stays with the original.

@@ -1,0 +1,42 @@
+// The parts of the ticket reader that walk one resource each.
+#pragma once
+
+#include <string>
+#include <unordered_map>
+
+#include "platform/jdf/jdf.h"
+#include "vorlan/LD_JDF.h"
+
+namespace vorlan::jdf {
+
+// Where each PDF of the worker's lists stands, by URL ignoring case, so that a ticket with many
+// runs finds the PDF it shares without searching the whole list each time.
+class PdfPositions {
+public:
+    // Indexes the PDFs already in the list.
+    explicit PdfPositions(const std::vector<LD_PDF*>& pdfs);
+    // Position of the first PDF with that URL (ignoring case), or -1.
+    int find(const wchar_t* url) const;
+    void add(const wchar_t* url, int position);
+
+private:
+    std::unordered_map<std::wstring, int> first_;
+};
+
+struct RunListReading {
+    LD_JDF& worker;
+    PdfPositions contentPositions;
+    PdfPositions markPositions;
+    explicit RunListReading(LD_JDF& w) : worker(w), contentPositions(w.contentPDFs), markPositions(w.markPDFs) {}
+};
+
+// Reads one RunList resource into runs and PDFs.
+void readRunListResource(RunListReading& reading, const JDF::JDFResource& runList);
+
+// Reads one Layout resource into the layout tree; LD_FAILED when a text copy cannot be made.
+LDError readLayoutResource(LD_JDF& worker, const JDF::KElement& layout);
+
+// Lower-case form of a URL, the key PDFs are shared by.
+std::wstring urlKey(const wchar_t* url);
+
+}  // namespace vorlan::jdf

@@ -1,0 +1,38 @@
+// Operands of clip-path operations: one class per operand shape.
+//
+// A clip path is written in PDF path syntax; each operator becomes an LD_ClipPathOperations whose
+// operands object is one of these (null for closepath). Objects are owned by their operation and
+// deleted through the base class; clone() copies the numbers and each point's text anew.
+#pragma once
+
+#include "vorlan/LD_Records.h"
+
+// moveto, lineto: one point.
+class LD_ClipPathOperandsOnePoint : public LD_ClipPathOperands {
+public:
+    LD_Point point1;
+    ~LD_ClipPathOperandsOnePoint() override = default;
+    LD_ClipPathOperands* clone() const override { return new LD_ClipPathOperandsOnePoint(*this); }
+};
+
+// v, y: two points.
+class LD_ClipPathOperandsTwoPoints : public LD_ClipPathOperandsOnePoint {
+public:
+    LD_Point point2;
+    LD_ClipPathOperands* clone() const override { return new LD_ClipPathOperandsTwoPoints(*this); }
+};
+
+// curveto: three points.
+class LD_ClipPathOperandsThreePoints : public LD_ClipPathOperandsTwoPoints {
+public:
+    LD_Point point3;
+    LD_ClipPathOperands* clone() const override { return new LD_ClipPathOperandsThreePoints(*this); }
+};
+
+// re: a corner point with width and height.
+class LD_ClipPathOperandsOnePointWidthHeight : public LD_ClipPathOperandsOnePoint {
+public:
+    double width = 0;
+    double height = 0;
+    LD_ClipPathOperands* clone() const override { return new LD_ClipPathOperandsOnePointWidthHeight(*this); }
+};
