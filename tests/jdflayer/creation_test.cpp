@@ -251,3 +251,46 @@ TEST(JdfWrite, Write2FileReplacesAtomicallyAndReportsFailure) {
     EXPECT_EQ(vorlan::test::readFile(target), doc.ToString());
     EXPECT_EQ(std::distance(fs::directory_iterator(tmp.path()), fs::directory_iterator()), 2);
 }
+
+TEST(JdfCreate, ReferencesFollowIdChangesCopiesAndDeletions) {
+    JDFDoc doc(0);
+    JDFNode root = doc.GetJDFRoot();
+    JDFMedia m = root.AppendMatchingResource(L"Media", 1);
+    JDFLayout layout = root.AppendMatchingResource(L"Layout", 1);
+    JDFElement ref = layout.RefMedia(m);
+    EXPECT_EQ(ref.GetTarget(), KElement(m));
+    EXPECT_EQ(layout.GetChildElementVector(L"Media").size(), 1u);
+    // Renaming the ID: the old reference no longer resolves, a new one does.
+    m.KElement::SetAttribute(L"ID", L"MediaX");
+    EXPECT_TRUE(ref.GetTarget().isNull());
+    ref.SetAttribute(L"rRef", L"MediaX");
+    EXPECT_EQ(ref.GetTarget(), KElement(m));
+    // A copied resource with the same ID: the first in document order answers.
+    KElement copy = root.GetResourcePool().CopyElement(m);
+    EXPECT_EQ(ref.GetTarget(), KElement(m));
+    // Deleting the target leaves the reference dangling, not crashing.
+    KElement(m).DeleteNode();
+    EXPECT_EQ(ref.GetTarget(), copy);
+    copy.DeleteNode();
+    EXPECT_TRUE(ref.GetTarget().isNull());
+    EXPECT_TRUE(root.GetMatchingResource(L"Media", 3).isNull());
+    EXPECT_FALSE(root.IsValid(5));
+    EXPECT_TRUE(root.IsValid(0));
+}
+
+TEST(JdfCreate, AttributeOrderAndDeclaredLists) {
+    JDFDoc doc(0);
+    EXPECT_EQ(doc.GetRoot().GetAttributeNames(),
+              (vWString{L"xmlns", L"Version", L"ID", L"JobPartID", L"Status"}));
+    EXPECT_EQ(doc.GetRoot().NumAttributes(), 5);
+    ElementInfo jdf = GetElementInfo(L"JDF");
+    EXPECT_TRUE(vWString(jdf.requiredAttributes, L",").contains(L"Type"));
+    EXPECT_TRUE(vWString(jdf.optionalAttributes, L",").contains(L"Activation"));
+    EXPECT_TRUE(vWString(jdf.optionalElements, L",").contains(L"ResourcePool"));
+    EXPECT_TRUE(jdf.partAttributes.empty());
+    ElementInfo media = GetElementInfo(L"Media");
+    EXPECT_TRUE(vWString(media.optionalAttributes, L",").contains(L"Dimension"));
+    EXPECT_TRUE(vWString(media.partAttributes, L",").contains(L"SheetName"));
+    EXPECT_TRUE(vWString(GetElementInfo(L"ContentObject").requiredAttributes, L",").contains(L"CTM"));
+    EXPECT_TRUE(GetElementInfo(L"Surface").optionalAttributes.empty());
+}

@@ -5,6 +5,7 @@
 
 #include <memory>
 #include <string>
+#include <unordered_map>
 
 #include <pugixml.hpp>
 
@@ -16,8 +17,19 @@ struct DocumentState {
 
     // A new ID: prefix followed by a six-digit counter, skipping IDs already in the document.
     std::string NewID(const char* prefix);
-    // The element whose ID attribute equals id, or a null node.
-    pugi::xml_node FindByID(const pugi::char_t* id) const;
+    // The first element (document order) whose ID attribute equals id, or a null node.
+    pugi::xml_node FindByID(const pugi::char_t* id);
+    // Every change that adds, removes or renames an ID, or removes elements, calls this; the
+    // ID index is then rebuilt on the next look-up. (Edits made directly on the pugixml tree
+    // must call it too.)
+    void IDsChanged() { idsDirty_ = true; }
+    // Records that element n now carries ID id (cheaper than IDsChanged).
+    void IDSet(const pugi::char_t* id, pugi::xml_node n);
+
+private:
+    void rebuild();
+    std::unordered_map<std::string, pugi::xml_node> ids_;
+    bool idsDirty_ = true;
 };
 
 using DocumentPtr = std::shared_ptr<DocumentState>;

@@ -12,10 +12,12 @@
 //   JDFXYPair, JDFRectangle, JDFMatrix (geometry.h); JDFException (exception.h)
 // Typical reading: JDFParser p; if (p.Parse(path)) { JDFNode root = JDFDoc(p.GetDocument()).GetJDFRoot(); … }
 // Handles convert implicitly from KElement (JDFRunList rl = someElement;) without a type check.
-// Enumeration numbers and their tokens: enum_tables.h.
+// Enumeration numbers and their tokens: enum_tables.h. Schema-declared attribute and element
+// lists per element kind (for descriptive listings): element_info.h.
 #pragma once
 
 #include "platform/jdf/attribute_map.h"
+#include "platform/jdf/element_info.h"
 #include "platform/jdf/enum_tables.h"
 #include "platform/jdf/exception.h"
 #include "platform/jdf/geometry.h"

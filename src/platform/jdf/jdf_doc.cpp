@@ -115,6 +115,7 @@ JDFDoc::JDFDoc(int type) : XMLDoc(std::make_shared<detail::DocumentState>()) {
     audit.append_attribute("TimeStamp").set_value(timeStamp().c_str());
     root.append_child("ResourcePool");
     root.append_child("ResourceLinkPool");
+    doc_->IDsChanged();
 }
 
 JDFNode JDFDoc::GetJDFRoot() const {

@@ -142,6 +142,7 @@ void KElement::SetAttribute(const WString& key, const WString& value, const WStr
     pugi::xml_attribute a = node_.attribute(k.c_str());
     if (!a) a = node_.append_attribute(k.c_str());
     a.set_value(value.getUTF8().c_str());
+    if (doc_ && k == "ID") doc_->IDSet(a.value(), node_);
 }
 
 void KElement::SetAttribute(const WString& key, int value, const WString& ns) {
@@ -155,7 +156,10 @@ void KElement::SetAttribute(const WString& key, double value, const WString& ns)
 }
 
 void KElement::RemoveAttribute(const WString& key, const WString& ns) {
-    if (pugi::xml_attribute a = findAttribute(node_, key, ns)) node_.remove_attribute(a);
+    if (pugi::xml_attribute a = findAttribute(node_, key, ns)) {
+        if (doc_ && std::strcmp(a.name(), "ID") == 0) doc_->IDsChanged();
+        node_.remove_attribute(a);
+    }
 }
 
 JDFAttributeMap KElement::GetAttributeMap() const {
@@ -163,6 +167,12 @@ JDFAttributeMap KElement::GetAttributeMap() const {
     for (pugi::xml_attribute a = node_.first_attribute(); a; a = a.next_attribute())
         m[WString(a.name())] = WString(a.value());
     return m;
+}
+
+vWString KElement::GetAttributeNames() const {
+    vWString names;
+    for (pugi::xml_attribute a = node_.first_attribute(); a; a = a.next_attribute()) names.push_back(WString(a.name()));
+    return names;
 }
 
 int KElement::NumAttributes() const {
@@ -293,6 +303,7 @@ KElement KElement::CopyElement(const KElement& src, const KElement& before) {
                            ? node_.append_copy(src.node_)
                            : node_.insert_copy_before(src.node_, before.node_);
     if (!n) return {};
+    if (doc_) doc_->IDsChanged();
     std::set<std::string> prefixes;
     collectPrefixes(n, prefixes);
     for (const std::string& p : prefixes) {
@@ -337,6 +348,7 @@ KElement KElement::GetDocRoot() const { return node_ ? wrap(documentElement(node
 void KElement::DeleteNode() {
     if (!node_) return;
     pugi::xml_node parent = node_.parent();
+    if (doc_) doc_->IDsChanged();
     if (parent) parent.remove_child(node_);
     node_ = pugi::xml_node();
 }

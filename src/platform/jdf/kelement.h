@@ -69,6 +69,8 @@ public:
     void RemoveAttribute(const WString& key, const WString& nameSpaceURI = L"");
     // All attributes (qualified name → value).
     JDFAttributeMap GetAttributeMap() const;
+    // Attribute names in document order.
+    vWString GetAttributeNames() const;
     int NumAttributes() const;
 
     // --- children ----------------------------------------------------------------------------
