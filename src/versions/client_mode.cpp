@@ -10,39 +10,42 @@
 
 namespace {
 
-using vorlan::versions::containsName;
-using vorlan::versions::removeFirstName;
+using vorlan::versions::NameCounts;
 
 // Removes every OCG of one kind except those named in keep: the name, its display name at the
 // same position, and its first entry in each default list.
 void pruneKind(XMLLayerData& layers, std::vector<wchar_t*>& ocgNames, std::vector<wchar_t*>& displayNames,
-               const std::vector<wchar_t*>& keep) {
-    std::vector<wchar_t*> keptNames, keptDisplayNames;
-    keptNames.reserve(ocgNames.size());  // nothing below allocates: the lists change all or not at all
-    keptDisplayNames.reserve(displayNames.size());
+               const NameCounts& keep) {
+    std::vector<bool> drop(ocgNames.size());
+    NameCounts removed;
     for (size_t i = 0; i < ocgNames.size(); ++i) {
-        wchar_t* name = ocgNames[i];
+        if (keep.contains(ocgNames[i])) continue;
+        drop[i] = true;
+        removed.add(ocgNames[i]);
+    }
+    removed.removeFrom(layers.defaultOnOCGNames);
+    removed.removeFrom(layers.defaultOffOCGNames);
+    // Nothing below allocates: the parallel lists shrink together.
+    size_t keptNames = 0, keptDisplayNames = 0;
+    for (size_t i = 0; i < ocgNames.size(); ++i) {
         wchar_t* displayName = i < displayNames.size() ? displayNames[i] : nullptr;
-        if (containsName(keep, name)) {
-            keptNames.push_back(name);
-            if (displayName) keptDisplayNames.push_back(displayName);
+        if (drop[i]) {
+            std::free(ocgNames[i]);
+            std::free(displayName);
             continue;
         }
-        removeFirstName(layers.defaultOnOCGNames, name);
-        removeFirstName(layers.defaultOffOCGNames, name);
-        std::free(name);
-        std::free(displayName);
+        ocgNames[keptNames++] = ocgNames[i];
+        if (i < displayNames.size()) displayNames[keptDisplayNames++] = displayName;
     }
-    for (size_t i = ocgNames.size(); i < displayNames.size(); ++i) keptDisplayNames.push_back(displayNames[i]);
-    ocgNames.swap(keptNames);
-    displayNames.swap(keptDisplayNames);
+    for (size_t i = ocgNames.size(); i < displayNames.size(); ++i) displayNames[keptDisplayNames++] = displayNames[i];
+    ocgNames.resize(keptNames);
+    displayNames.resize(keptDisplayNames);
 }
 
 }  // namespace
 
 LDError LD_JDF::applyClientModeChangesToXMLBufferData() {
     const LD_DieCut* die = m_XMLDieCuts.empty() ? nullptr : m_XMLDieCuts.front();
-    const std::vector<wchar_t*> none;
     const bool layerMode = defaultLayerMode;
 
     for (XMLVersionData* version : versions)
@@ -53,14 +56,15 @@ LDError LD_JDF::applyClientModeChangesToXMLBufferData() {
             }
 
     try {
+        // Without a die cut nothing is kept.
+        NameCounts keep;
+        if (die) keep = NameCounts(layerMode ? die->dieSepInternalNames : die->dieLayerInternalNames);
         for (auto& [pdf, layers] : layerDataMap) {
             if (!layers) continue;
             if (layerMode)
-                pruneKind(*layers, layers->sepOCGNames, layers->sepDisplayNames,
-                          die ? die->dieSepInternalNames : none);
+                pruneKind(*layers, layers->sepOCGNames, layers->sepDisplayNames, keep);
             else
-                pruneKind(*layers, layers->layerOCGNames, layers->layerDisplayNames,
-                          die ? die->dieLayerInternalNames : none);
+                pruneKind(*layers, layers->layerOCGNames, layers->layerDisplayNames, keep);
         }
     } catch (const std::bad_alloc&) {
         lastError = LD_FAILED;

@@ -27,13 +27,22 @@ T* adopt(std::vector<T*>& owner, std::unique_ptr<T> record) {
 
 // Appends a new copy of text to list.
 void appendCopy(std::vector<wchar_t*>& list, const std::wstring& text) {
-    list.reserve(list.size() + 1);
-    list.push_back(newTextCopy(text));
+    wchar_t* copy = newTextCopy(text);
+    try {
+        list.push_back(copy);
+    } catch (...) {
+        std::free(copy);
+        throw;
+    }
 }
 
 class DescriptionReader {
 public:
-    DescriptionReader(LD_JDF& worker, bool hasTicket) : worker_(worker), hasTicket_(hasTicket) {}
+    DescriptionReader(LD_JDF& worker, bool hasTicket)
+        : worker_(worker),
+          hasTicket_(hasTicket),
+          nestedLayers_(worker.layerNameList),
+          nestedSeparations_(worker.nestedComponentList) {}
 
     // Handles the root's children in document order; 0, or 9 for a pdfIndex naming no content run.
     LDError readChildren(const _kvXmlNode* root) {
@@ -99,7 +108,10 @@ private:
                 appendCopy(defaultOn ? record->defaultOnOCGNames : record->defaultOffOCGNames, ocgName);
             }
         }
-        if (isNested) appendCopy(isSep ? worker_.nestedComponentList : worker_.layerNameList, ocgName);
+        if (isNested) {
+            appendCopy(isSep ? worker_.nestedComponentList : worker_.layerNameList, ocgName);
+            (isSep ? nestedSeparations_ : nestedLayers_).add(ocgName.c_str());
+        }
         return LD_OK;
     }
 
@@ -148,19 +160,21 @@ private:
         return record;
     }
 
-    // The switches of one placed object; nested names known so far are filtered out.
+    // The switches of one placed object. Nested names known so far are filtered out, as
+    // removeNestedComponentsFromList does against the worker's lists; the counts kept beside those
+    // lists make that one pass over the switches instead of one per nested name.
     void readContentObject(const _kvXmlNode* object, std::vector<XMLContentObjectData*>& owner) {
         auto created = std::make_unique<XMLContentObjectData>();
         created->index = attributeNumber(object, "index");
         XMLContentObjectData* record = adopt(owner, std::move(created));
         appendNameList(worker_, object, "LayerNameOn", record->layerNameOn);
-        worker_.removeNestedComponentsFromList(record->layerNameOn, worker_.layerNameList);
+        nestedLayers_.removeFrom(record->layerNameOn);
         appendNameList(worker_, object, "LayerNameOff", record->layerNameOff);
-        worker_.removeNestedComponentsFromList(record->layerNameOff, worker_.layerNameList);
+        nestedLayers_.removeFrom(record->layerNameOff);
         appendNameList(worker_, object, "SepNameOn", record->sepNameOn);
-        worker_.removeNestedComponentsFromList(record->sepNameOn, worker_.nestedComponentList);
+        nestedSeparations_.removeFrom(record->sepNameOn);
         appendNameList(worker_, object, "SepNameOff", record->sepNameOff);
-        worker_.removeNestedComponentsFromList(record->sepNameOff, worker_.nestedComponentList);
+        nestedSeparations_.removeFrom(record->sepNameOff);
     }
 
     // A later DieCut element decides dieEnabled; every child adds one die cut.
@@ -177,6 +191,8 @@ private:
 
     LD_JDF& worker_;
     const bool hasTicket_;
+    vorlan::versions::NameCounts nestedLayers_;       // layerNameList, counted
+    vorlan::versions::NameCounts nestedSeparations_;  // nestedComponentList, counted
 };
 
 // The description's records go when reading fails: nothing downstream may use half a description.

@@ -1,26 +1,47 @@
-// OCG name lists: look-up, removal, and the filtering of nested names.
+// OCG name lists: case-insensitive counting and removal, and the filtering of nested names.
 #include "versions/name_lists.h"
 
-#include <algorithm>
 #include <cstdlib>
+#include <cwctype>
 
-#include "platform/os/text.h"
 #include "vorlan/LD_JDF.h"
 
 namespace vorlan::versions {
 
-bool containsName(const std::vector<wchar_t*>& list, const wchar_t* name) {
-    return std::any_of(list.begin(), list.end(),
-                       [name](const wchar_t* entry) { return vorlan::os::equalsIgnoreCase(entry, name); });
+std::wstring foldName(const wchar_t* name) {
+    std::wstring folded = name ? name : L"";
+    for (wchar_t& c : folded) c = static_cast<wchar_t>(std::towlower(static_cast<wint_t>(c)));
+    return folded;
 }
 
-bool removeFirstName(std::vector<wchar_t*>& list, const wchar_t* name) {
-    auto found = std::find_if(list.begin(), list.end(),
-                              [name](const wchar_t* entry) { return vorlan::os::equalsIgnoreCase(entry, name); });
-    if (found == list.end()) return false;
-    std::free(*found);
-    list.erase(found);
-    return true;
+NameCounts::NameCounts(const std::vector<wchar_t*>& names) {
+    for (const wchar_t* name : names) add(name);
+}
+
+void NameCounts::add(const wchar_t* name) {
+    if (name) ++counts_[foldName(name)];
+}
+
+bool NameCounts::contains(const wchar_t* name) const { return name && counts_.count(foldName(name)) > 0; }
+
+void NameCounts::removeFrom(std::vector<wchar_t*>& list) const {
+    if (counts_.empty() || list.empty()) return;
+    // First decide (this may run out of memory, and then nothing has changed), then free.
+    std::vector<bool> drop(list.size());
+    std::unordered_map<std::wstring, size_t> removed;
+    for (size_t i = 0; i < list.size(); ++i) {
+        if (!list[i]) continue;
+        auto counted = counts_.find(foldName(list[i]));
+        if (counted != counts_.end() && removed[counted->first]++ < counted->second) drop[i] = true;
+    }
+    size_t kept = 0;
+    for (size_t i = 0; i < list.size(); ++i) {
+        if (drop[i])
+            std::free(list[i]);
+        else
+            list[kept++] = list[i];
+    }
+    list.resize(kept);
 }
 
 }  // namespace vorlan::versions
@@ -28,5 +49,5 @@ bool removeFirstName(std::vector<wchar_t*>& list, const wchar_t* name) {
 // For each nested name in order, the first equal entry of list goes; later equal entries stay.
 void LD_JDF::removeNestedComponentsFromList(std::vector<wchar_t*>& list, std::vector<wchar_t*>& nested) {
     if (&list == &nested) return;
-    for (const wchar_t* name : nested) vorlan::versions::removeFirstName(list, name);
+    vorlan::versions::NameCounts(nested).removeFrom(list);
 }
