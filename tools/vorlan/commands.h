@@ -10,5 +10,6 @@ int runValid(Args args);
 int runAutoimpose(Args args);
 int runScanXmp(Args args);
 int runJobAttr(Args args);
+int runInspect(Args args);
 
 }  // namespace vorlan::cli

@@ -19,6 +19,7 @@ void printUsage() {
         "  autoimpose  impose a ticket from an auto-impose settings file\n"
         "  scan-xmp    scan a PDF's inks into a version description\n"
         "  job-attr    read or set a job attribute in the local job store\n"
+        "  inspect     print what the query interface sees of a JDF ticket\n"
         "\n"
         "Run 'vorlan <command> --help' for a command's arguments. The exit status is the result code.");
 }
@@ -38,6 +39,7 @@ int main(int argc, char** argv) {
     if (command == "autoimpose") return vorlan::cli::runAutoimpose(args);
     if (command == "scan-xmp") return vorlan::cli::runScanXmp(args);
     if (command == "job-attr") return vorlan::cli::runJobAttr(args);
+    if (command == "inspect") return vorlan::cli::runInspect(args);
     std::fprintf(stderr, "vorlan: unknown command '%s'\n\n", command.c_str());
     printUsage();
     return 2;
