@@ -17,6 +17,7 @@ namespace {
 const std::set<std::string> kMalformed = {"libj_corrupt.jdf", "sch_invalid_INVALID-MISPrepress-ICS-Complex.jdf"};
 
 std::vector<fs::path> corpusTickets() {
+    if (vorlan::test::corpusDir().empty()) return {};
     std::vector<fs::path> out;
     for (const auto& e : fs::directory_iterator(vorlan::test::corpusDir() / "jdf")) {
         std::string ext = e.path().extension().string();
@@ -56,6 +57,74 @@ TEST(JdfCorpus, EveryTicketRoundTripsAndBrokenOnesFailCleanly) {
         EXPECT_EQ(doc.ToString(), again.GetDocument().ToString());
     }
     EXPECT_EQ(failed, 2);
+}
+
+// Every read call the ticket reader makes, on every element kind it meets; nothing may throw.
+static void walkForReading(const JDFNode& root, int& runs, int& media, int& placed) {
+    for (const char* type : {"Imposition", "Combined"})
+        for (const KElement& n : root.GetvJDFNode(WString(type), 6, false)) {
+            JDFNode node(n);
+            (void)node.GetTypes().contains(L"Imposition");
+            (void)node.GetActivation(true);
+            JDFResourcePool pool = node.GetResourcePool();
+            for (const KElement& e : pool.GetPoolChildren(L"*", JDFAttributeMap(), L"*")) {
+                JDFResource r(e);
+                if (!r.IsResource(true)) continue;
+                (void)JDFElement(r).GetStatus();
+                (void)r.GetStatus();
+                for (const KElement& l : r.GetLinks(L"*")) (void)JDFResourceLink(l).GetProcessUsage();
+                if (r.GetLocalName() == L"RunList") {
+                    for (const KElement& p : r.GetChildElementVector(L"RunList", L"*", JDFAttributeMap(), true, 0, false)) {
+                        JDFRunList part(p);
+                        (void)part.GetPages().ToVInt(1000);
+                        (void)part.GetNPage();
+                        (void)part.GetLayoutElement().IsBlank();
+                        (void)part.GetFileURL();
+                        ++runs;
+                    }
+                }
+            }
+            for (const char* kind : {"Layout", "InterpretingParams", "RenderingParams", "DigitalPrintingParams", "RunList"})
+                (void)node.GetMatchingResource(WString(kind), 3);
+        }
+    for (const KElement& e : root.GetChildrenByTagName(L"Media", L"", JDFAttributeMap(), false)) {
+        JDFMedia m(e);
+        (void)m.GetMediaType();
+        (void)m.GetDimension().GetX();
+        (void)m.GetMediaUnit();
+        (void)m.GetGrainDirection();
+        (void)(m.GetThickness() + m.GetWeight());
+        ++media;
+    }
+    for (const KElement& l : root.GetChildrenByTagName(L"Layout", L"*", JDFAttributeMap(), false))
+        for (const KElement& c : JDFElement(l).GetChildElementVector(L"*", L"*"))
+            for (const KElement& o : c.GetChildrenByTagName(L"*", L"*", JDFAttributeMap(), false)) {
+                JDFContentObject co(o);
+                (void)co.GetCTM();
+                (void)co.GetClipBox();
+                (void)co.GetOrd();
+                ++placed;
+            }
+}
+
+TEST(JdfCorpus, ReadingCallsWorkOnEveryTicket) {
+    VORLAN_REQUIRE_CORPUS();
+    int runs = 0, media = 0, placed = 0, roots = 0;
+    for (const fs::path& file : corpusTickets()) {
+        if (kMalformed.count(file.filename().string())) continue;
+        SCOPED_TRACE(file.filename().string());
+        JDFParser parser;
+        ASSERT_TRUE(parser.Parse(WString(file.string())));
+        JDFNode root = JDFDoc(parser.GetDocument()).GetJDFRoot();
+        if (root.isNull()) continue;
+        ++roots;
+        EXPECT_NO_THROW(walkForReading(root, runs, media, placed));
+    }
+    // The corpus is varied enough that every path above is taken.
+    EXPECT_GT(roots, 50);
+    EXPECT_GT(runs, 20);
+    EXPECT_GT(media, 20);
+    EXPECT_GT(placed, 100);
 }
 
 TEST(JdfCorpus, DocumentOutlivesParserAndJdfRootIsFound) {

@@ -194,7 +194,7 @@ TEST(JdfCreate, RunListsAndLinkPools) {
     EXPECT_EQ(partLink.GetElement(L"Part").GetAttribute(L"Run"), L"0");
     EXPECT_EQ(partLink.GetTarget(), KElement(a));
     // A second copy of the same resource gets a fresh ID.
-    EXPECT_NE(root.GetResourcePool().CopyResource(foreign).GetID(), L"M1");
+    EXPECT_NE(root.GetResourcePool().AppendResource(foreign).GetID(), L"M1");
 }
 
 TEST(JdfCreate, DeleteCopyAndElementEdits) {

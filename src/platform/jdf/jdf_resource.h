@@ -101,6 +101,7 @@ public:
     // Appends a deep copy of a resource (from any document). The copy keeps its ID unless the ID
     // is already taken in this document, in which case it gets a new one.
     JDFResource CopyResource(const JDFResource& src);
+    JDFResource AppendResource(const JDFResource& src) { return CopyResource(src); }
 };
 
 class JDFResourceLinkPool : public JDFElement {
