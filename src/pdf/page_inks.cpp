@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <exception>
 #include <set>
+#include <tuple>
 #include <unordered_set>
 
 #include <qpdf/QPDFPageObjectHelper.hh>
@@ -22,6 +23,9 @@ struct InkList {
     std::unordered_set<const ColourSpace*> seen;  // spaces already added
     std::vector<ColourSpaceRef> keep;             // keeps seen spaces alive (no address reuse)
     std::set<QPDFObjGen> openStreams;             // forms/patterns being walked (loop guard)
+    // Streams already walked on this page with a given inherited colour state: walking them
+    // again cannot add an ink (a form used many times is read once per state).
+    std::set<std::tuple<QPDFObjGen, const ColourSpace*, const ColourSpace*, std::string, std::string>> walked;
 
     void add(const ColourSpaceRef& cs) {
         if (!cs || !seen.insert(cs.get()).second) return;
@@ -88,6 +92,15 @@ private:
     void walkNested(QPDFObjectHandle stream, const GraphicsState& start) {
         if (!stream.isStream() || depth_ >= kMaxNesting) return;
         const QPDFObjGen id = stream.getObjGen();
+        // Only streams with their own resources: others resolve names against the user's.
+        const bool ownResources = stream.getDict().getKey("/Resources").isDictionary();
+        if (ownResources) {
+            if (!list_.walked.emplace(id, start.fill.get(), start.stroke.get(), start.fillPattern,
+                                      start.strokePattern).second)
+                return;
+            list_.keep.push_back(start.fill);  // the key's addresses stay taken
+            list_.keep.push_back(start.stroke);
+        }
         if (!list_.openStreams.insert(id).second) return;
         InkWalker nested(streamResources(stream, resources()), cache_, list_, depth_ + 1, start);
         nested.walkStream(stream);
