@@ -1,0 +1,154 @@
+// Geometry strings: boxes, matrices, points, clip paths and the mark test.
+#include <cstdlib>
+#include <memory>
+
+#include <gtest/gtest.h>
+
+#include "model/geometry_strings.h"
+#include "platform/jdf/wstring.h"
+#include "vorlan/LD_JDF.h"
+
+namespace {
+
+struct ClipPath {
+    std::vector<LD_ClipPathOperations*> ops;
+    bool wellFormed = true;
+    explicit ClipPath(const wchar_t* text) { wellFormed = LD_JDF::parseStringAsClipPathOperations(text, ops); }
+    ~ClipPath() {
+        for (auto* op : ops) delete op;
+    }
+    const LD_Point& point(size_t i) const {
+        return dynamic_cast<const LD_ClipPathOperandsOnePoint&>(*ops.at(i)->operands).point1;
+    }
+};
+
+TEST(GeometryStrings, BoxTakesFourNumbersAndCyclesThroughFurtherOnes) {
+    LD_Box box;
+    LD_JDF::parseStringAsBox(L"0 0 612 792", &box);
+    EXPECT_EQ(box.lowerLeft.x, 0);
+    EXPECT_EQ(box.upperRight.x, 612);
+    EXPECT_EQ(box.upperRight.y, 792);
+
+    LD_Box shortBox;
+    LD_JDF::parseStringAsBox(L"1 2 3", &shortBox);
+    EXPECT_EQ(shortBox.lowerLeft.x, -1);
+    EXPECT_EQ(shortBox.upperRight.y, -1);
+
+    LD_Box longBox;
+    LD_JDF::parseStringAsBox(L"1 2 3 4 5", &longBox);
+    EXPECT_EQ(longBox.lowerLeft.x, 5);
+    EXPECT_EQ(longBox.upperRight.y, 4);
+    EXPECT_EQ(box.text, nullptr);  // the parser never sets the text
+}
+
+TEST(GeometryStrings, OnlySingleSpacesSeparateNumbers) {
+    LD_Box box;
+    LD_JDF::parseStringAsBox(L"1  2   3 4", &box);
+    EXPECT_EQ(box.lowerLeft.y, 2);
+    EXPECT_EQ(box.upperRight.x, 3);
+    std::unique_ptr<std::vector<double>> numbers(LD_JDF::splitIntoFloatTokensBySpace(L"10\t20 30"));
+    ASSERT_EQ(numbers->size(), 2u);  // the tab joins two numbers into one token, read as 10
+    EXPECT_EQ((*numbers)[0], 10);
+    EXPECT_EQ((*numbers)[1], 30);
+    std::unique_ptr<std::vector<double>> odd(LD_JDF::splitIntoFloatTokensBySpace(L"abc -2.5e1 +3"));
+    EXPECT_EQ(*odd, (std::vector<double>{0, -25, 3}));
+}
+
+TEST(GeometryStrings, MatrixNeedsSixNumbersAndIgnoresMore) {
+    LD_CTM ctm;
+    LD_JDF::parseStringAsCTM(L"1 0 0 1 10 20 30", &ctm);
+    EXPECT_EQ(ctm.e, 10);
+    EXPECT_EQ(ctm.f, 20);
+    LD_CTM identity;
+    LD_JDF::parseStringAsCTM(L"2 0 0 2 5", &identity);
+    EXPECT_EQ(identity.a, 1);
+    EXPECT_EQ(identity.e, 0);
+}
+
+TEST(GeometryStrings, PointsComeInPairs) {
+    std::vector<LD_Point*> points;
+    LD_JDF::parseStringAsPoints(L"10 20 30", points);
+    ASSERT_EQ(points.size(), 1u);
+    EXPECT_EQ(points[0]->x, 10);
+    EXPECT_EQ(points[0]->y, 20);
+    LD_JDF::parseStringAsPoints(L"7", points);
+    EXPECT_EQ(points.size(), 1u);
+    for (auto* p : points) delete p;
+}
+
+TEST(GeometryStrings, ClipPathOperatorsAndTheirOperands) {
+    ClipPath square(L"0 0 m 100 0 l 100 100 l h");
+    EXPECT_TRUE(square.wellFormed);
+    ASSERT_EQ(square.ops.size(), 4u);
+    EXPECT_EQ(square.ops[0]->operation, CLIP_MOVETO);
+    EXPECT_EQ(square.ops[1]->operation, CLIP_LINETO);
+    EXPECT_EQ(square.ops[3]->operation, CLIP_CLOSEPATH);
+    EXPECT_EQ(square.ops[3]->operands, nullptr);
+    EXPECT_EQ(square.point(1).x, 100);
+    EXPECT_EQ(square.point(2).y, 100);
+
+    ClipPath rect(L"10 20 30 40 re");
+    ASSERT_EQ(rect.ops.size(), 1u);
+    auto& re = dynamic_cast<LD_ClipPathOperandsOnePointWidthHeight&>(*rect.ops[0]->operands);
+    EXPECT_EQ(re.point1.x, 10);
+    EXPECT_EQ(re.width, 30);
+    EXPECT_EQ(re.height, 40);
+
+    ClipPath curves(L"1 2 3 4 5 6 c 7 8 9 10 v 11 12 13 14 y");
+    ASSERT_EQ(curves.ops.size(), 3u);
+    auto& c = dynamic_cast<LD_ClipPathOperandsThreePoints&>(*curves.ops[0]->operands);
+    EXPECT_EQ(c.point3.y, 6);
+    auto& y = dynamic_cast<LD_ClipPathOperandsTwoPoints&>(*curves.ops[2]->operands);
+    EXPECT_EQ(curves.ops[2]->operation, CLIP_CURVETO_Y);
+    EXPECT_EQ(y.point2.x, 13);
+    // Only the leading characters name the operator.
+    ClipPath words(L"1 2 lineto 3 4 5 6 rect");
+    ASSERT_EQ(words.ops.size(), 2u);
+    EXPECT_EQ(words.ops[1]->operation, CLIP_RECTANGLE);
+}
+
+TEST(GeometryStrings, OperatorWithWrongCountOfNumbersIsLeftOut) {
+    ClipPath tooFew(L"5 m 1 2 l");
+    EXPECT_FALSE(tooFew.wellFormed);
+    ASSERT_EQ(tooFew.ops.size(), 1u);  // the moveto had one number: it is dropped, never over-read
+    EXPECT_EQ(tooFew.ops[0]->operation, CLIP_LINETO);
+    EXPECT_EQ(tooFew.point(0).x, 1);
+    ClipPath curve(L"1 2 3 c");
+    EXPECT_FALSE(curve.wellFormed);
+    EXPECT_TRUE(curve.ops.empty());
+    ClipPath close(L"3 h 0 0 m 9");  // numbers before h, and trailing numbers, are not used
+    EXPECT_FALSE(close.wellFormed);
+    ASSERT_EQ(close.ops.size(), 1u);
+    EXPECT_EQ(close.ops[0]->operation, CLIP_MOVETO);
+    ClipPath re(L"1 2 3 re");
+    EXPECT_TRUE(re.ops.empty());
+}
+
+TEST(GeometryStrings, CloneCopiesNumbersAndTexts) {
+    LD_ClipPathOperandsThreePoints original;
+    original.point1.x = 3;
+    original.point3.text = LD_CopyText(L"3 4");
+    std::unique_ptr<LD_ClipPathOperands> copy(original.clone());
+    auto& typed = dynamic_cast<LD_ClipPathOperandsThreePoints&>(*copy);
+    EXPECT_EQ(typed.point1.x, 3);
+    EXPECT_EQ(typed.point2.x, -1);
+    ASSERT_NE(typed.point3.text, nullptr);
+    EXPECT_NE(typed.point3.text, original.point3.text);
+    EXPECT_STREQ(typed.point3.text, L"3 4");
+    LD_ClipPathOperandsOnePointWidthHeight fresh;
+    EXPECT_EQ(fresh.width, 0);
+    EXPECT_EQ(fresh.point1.y, -1);
+}
+
+TEST(GeometryStrings, MarkPresentInAnyCase) {
+    EXPECT_TRUE(LD_JDF::isMarkPresent(L"Marks"));
+    EXPECT_TRUE(LD_JDF::isMarkPresent(L"cropmark.pdf"));
+    EXPECT_TRUE(LD_JDF::isMarkPresent(L"MMARK"));
+    EXPECT_TRUE(LD_JDF::isMarkPresent(L"xMaRkx"));
+    EXPECT_FALSE(LD_JDF::isMarkPresent(L""));
+    EXPECT_FALSE(LD_JDF::isMarkPresent(L"ma rk"));
+    EXPECT_FALSE(LD_JDF::isMarkPresent(L"mar"));
+    EXPECT_FALSE(LD_JDF::isMarkPresent(nullptr));
+}
+
+}  // namespace
