@@ -1,5 +1,6 @@
 // vorlan valid, autoimpose and scan-xmp.
 #include <cstdio>
+#include <filesystem>
 #include <string>
 #include <vector>
 
@@ -37,13 +38,27 @@ int runScanXmp(Args args) {
     if (wantsHelp(args) || args.size() != 2) {
         std::fputs("usage: vorlan scan-xmp [--die-library] [--json] PDF OUTPUT_DESCRIPTION\n\n"
                    "Writes a version description from the PDF's inks: by default from the Esko technical\n"
-                   "inks of its XMP ink list; with --die-library by matching its pages against the die library.\n",
+                   "inks of its XMP ink list; with --die-library by matching its pages against the die library.\n"
+                   "Exit status: 1 after the Esko mode, 2 after the die-library mode; check whether the\n"
+                   "description was written.\n",
                    wantsHelp(args) ? stdout : stderr);
         return wantsHelp(args) ? 0 : 2;
     }
     std::vector<char> output(args[1].begin(), args[1].end());
     output.push_back('\0');
-    return reportResult(vorlan_scan_xmp(args[0].c_str(), output.data(), dieLibrary ? "True" : "False"), json);
+    // The scan's result says which mode ran (1 Esko inks, 2 die library), not whether a
+    // description came out of it: tell the operator whether the file was written.
+    int code = vorlan_scan_xmp(args[0].c_str(), output.data(), dieLibrary ? "True" : "False");
+    std::error_code ec;
+    bool written = std::filesystem::exists(args[1], ec);
+    const char* mode = code == 2 ? "die library" : "Esko technical inks";
+    if (json)
+        std::printf("{\"result\": %d, \"mode\": %s, \"description\": %s, \"written\": %s}\n", code,
+                    jsonString(mode).c_str(), jsonString(args[1]).c_str(), written ? "true" : "false");
+    else
+        std::printf("result: %d (%s scan ran); description %s: %s\n", code, mode, written ? "written" : "not written",
+                    args[1].c_str());
+    return code;
 }
 
 }  // namespace vorlan::cli
