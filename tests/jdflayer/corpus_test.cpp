@@ -154,3 +154,30 @@ TEST(JdfParser, MissingFileAndNonXmlFailWithoutThrowing) {
     ASSERT_TRUE(parser.ParseString("<JMF/>"));
     EXPECT_TRUE(JDFDoc(parser.GetDocument()).GetJDFRoot().isNull());
 }
+
+TEST(JdfParser, DeeplyNestedInputIsHandledWithoutRecursion) {
+    const int depth = 200000;
+    std::string xml = "<JDF xmlns='http://www.CIP4.org/JDFSchema_1_1' xmlns:eg='urn:eg'><ResourcePool>"
+                      "<RunList ID='deep' Status='Available' eg:x='1'>";
+    for (int i = 0; i < depth; ++i) xml += "<RunList>";
+    xml += "<eg:Leaf/>";
+    for (int i = 0; i < depth; ++i) xml += "</RunList>";
+    xml += "</RunList></ResourcePool></JDF>";
+    JDFParser parser;
+    ASSERT_TRUE(parser.ParseString(xml));
+    JDFNode root = JDFDoc(parser.GetDocument()).GetJDFRoot();
+    KElement leaf = root.GetChildByTagName(L"Leaf", L"urn:eg", 0, JDFAttributeMap(), false);
+    ASSERT_FALSE(leaf.isNull());
+    JDFRunList deepest = leaf.GetParentNode();
+    EXPECT_TRUE(deepest.IsResource(true));
+    EXPECT_EQ(deepest.GetStatus(), 7);
+    EXPECT_EQ(deepest.GetResourceRoot().GetID(), L"deep");
+    JDFDoc other(0);
+    KElement copy = other.GetJDFRoot().GetResourcePool().CopyElement(root.GetResourcePool().GetElement(L"RunList"));
+    EXPECT_EQ(copy.GetNamespaceURIFromPrefix(L"eg"), L"urn:eg");
+    // Written without indentation: the output stays proportional to the input.
+    vorlan::test::TempDir tmp;
+    ASSERT_TRUE(other.Write2File(WString((tmp / "deep.jdf").string())));
+    EXPECT_LT(fs::file_size(tmp / "deep.jdf"), 2 * xml.size());
+    EXPECT_EQ(other.ToString().size(), fs::file_size(tmp / "deep.jdf"));
+}

@@ -17,8 +17,29 @@
 namespace JDF {
 namespace {
 
-constexpr unsigned kFormat = pugi::format_indent;
 const char* const kIndent = "  ";
+// Indentation grows with depth, so output of a deeply nested tree would grow with the square of
+// its depth: beyond this depth documents are written without indentation.
+constexpr int kMaxIndentedDepth = 100;
+
+// Indented, unless the tree nests deeper than kMaxIndentedDepth.
+unsigned formatFor(const pugi::xml_document& doc) {
+    int depth = 0;
+    pugi::xml_node n = doc.first_child();
+    while (n) {
+        if (n.first_child()) {
+            n = n.first_child();
+            if (++depth > kMaxIndentedDepth) return pugi::format_raw;
+            continue;
+        }
+        while (n && !n.next_sibling()) {
+            n = n.parent();
+            --depth;
+        }
+        if (n) n = n.next_sibling();
+    }
+    return pugi::format_indent;
+}
 
 class FdWriter : public pugi::xml_writer {
 public:
@@ -68,7 +89,7 @@ KElement XMLDoc::GetRoot() const {
 std::string XMLDoc::ToString() const {
     if (!doc_) return {};
     std::ostringstream out;
-    doc_->doc.save(out, kIndent, kFormat, pugi::encoding_utf8);
+    doc_->doc.save(out, kIndent, formatFor(doc_->doc), pugi::encoding_utf8);
     return out.str();
 }
 
@@ -84,7 +105,7 @@ bool XMLDoc::Write2File(const WString& fileName) const {
     FdWriter writer(fd);
     bool ok = true;
     try {
-        doc_->doc.save(writer, kIndent, kFormat, pugi::encoding_utf8);
+        doc_->doc.save(writer, kIndent, formatFor(doc_->doc), pugi::encoding_utf8);
     } catch (...) {
         ok = false;
     }

@@ -16,7 +16,8 @@ public:
     bool isNull() const { return !doc_; }
     // The root element; null for an empty or null document.
     KElement GetRoot() const;
-    // Writes the document (UTF-8, two-space indentation, deterministic bytes) to a temporary
+    // Writes the document (UTF-8, two-space indentation — none for trees nested deeper than 100
+    // levels, whose indentation would outgrow the content —, deterministic bytes) to a temporary
     // file in the target's folder and renames it over the target, so a failed or interrupted
     // write never leaves a partial file. Returns false (target untouched) on any failure.
     bool Write2File(const WString& fileName) const;

@@ -1,6 +1,8 @@
 // JDFElement: enumeration, status and resource helpers.
 #include "platform/jdf/jdf_element.h"
 
+#include <cstring>
+
 #include "platform/jdf/enum_tables.h"
 
 namespace JDF {
@@ -13,11 +15,13 @@ void JDFElement::SetStatus(int status) { SetEnumAttribute(L"Status", status, Tab
 
 bool JDFElement::IsResource(bool bPartition) const {
     if (isNull()) return false;
-    KElement parent = GetParentNode();
-    if (parent.isNull()) return false;
-    if (parent.GetLocalName() == L"ResourcePool") return true;
-    if (!bPartition || parent.GetNodeName() != GetNodeName()) return false;
-    return JDFElement(parent).IsResource(true);
+    const char* name = node_.name();
+    for (pugi::xml_node n = node_.parent(); n; n = n.parent()) {
+        const char* colon = std::strchr(n.name(), ':');
+        if (std::strcmp(colon ? colon + 1 : n.name(), "ResourcePool") == 0) return true;
+        if (!bPartition || std::strcmp(n.name(), name) != 0) return false;
+    }
+    return false;
 }
 
 int JDFElement::GetEnumAttribute(const WString& key, const wchar_t* table, int def) const {

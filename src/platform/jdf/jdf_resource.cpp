@@ -115,6 +115,15 @@ JDFResource JDFResource::GetCreatePartition(int partIDKey, const WString& value,
     return part;
 }
 
+JDFResource JDFResource::AddPartition(int partIDKey, const WString& value) {
+    if (isNull()) return {};
+    WString key = Tables::Token(Tables::PartIDKey, partIDKey);
+    AddPartIDKey(partIDKey);
+    JDFResource part = AppendElement(GetNodeName());
+    part.KElement::SetAttribute(key, value);
+    return part;
+}
+
 JDFResource JDFResource::GetPartition(const JDFAttributeMap& partMap) const {
     if (isNull()) return {};
     if (partMap.empty()) return *this;

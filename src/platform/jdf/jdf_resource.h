@@ -49,6 +49,9 @@ public:
     // The direct child partition with key = value, created when missing (the key joins
     // PartIDKeys of the root). partIDKeys, when given, replaces PartIDKeys first.
     JDFResource GetCreatePartition(int partIDKey, const WString& value, const vWString& partIDKeys = vWString());
+    // Appends a new child partition with key = value without looking for an existing one (the
+    // key joins PartIDKeys of the root): for writers that make each value once, in constant time.
+    JDFResource AddPartition(int partIDKey, const WString& value);
     // The partition (at any depth) whose part map holds all entries of partMap; null when none.
     JDFResource GetPartition(const JDFAttributeMap& partMap) const;
 

@@ -44,14 +44,25 @@ bool lookupNamespace(pugi::xml_node n, const std::string& prefix, std::string& u
     return false;
 }
 
-void collectPrefixes(pugi::xml_node n, std::set<std::string>& out) {
-    out.insert(prefixOf(n.name()));
-    for (pugi::xml_attribute a = n.first_attribute(); a; a = a.next_attribute()) {
-        std::string p = prefixOf(a.name());
-        if (!p.empty() && p != "xmlns") out.insert(p);
+void collectPrefixes(pugi::xml_node top, std::set<std::string>& out) {
+    // Iterative walk of the subtree: documents may nest deeper than the stack allows.
+    pugi::xml_node n = top;
+    while (n) {
+        if (n.type() == pugi::node_element) {
+            out.insert(prefixOf(n.name()));
+            for (pugi::xml_attribute a = n.first_attribute(); a; a = a.next_attribute()) {
+                std::string p = prefixOf(a.name());
+                if (!p.empty() && p != "xmlns") out.insert(p);
+            }
+            if (n.first_child()) {
+                n = n.first_child();
+                continue;
+            }
+        }
+        while (n != top && !n.next_sibling()) n = n.parent();
+        if (n == top) break;
+        n = n.next_sibling();
     }
-    for (pugi::xml_node c = n.first_child(); c; c = c.next_sibling())
-        if (c.type() == pugi::node_element) collectPrefixes(c, out);
 }
 
 // Finds the attribute for key (and optional namespace) on n.
@@ -181,35 +192,62 @@ int KElement::NumAttributes() const {
     return n;
 }
 
-bool KElement::MatchesName(const WString& name, const WString& ns) const {
-    if (!node_) return false;
-    if (!isWildcard(name)) {
-        std::string n = name.getUTF8();
-        const char* have = n.find(':') != std::string::npos ? node_.name() : localOf(node_.name());
-        if (n != have) return false;
+namespace {
+
+// A name / namespace / attribute filter compiled once per look-up.
+class Matcher {
+public:
+    Matcher(const WString& name, const WString& ns, const JDFAttributeMap& attrs, bool bAnd)
+        : anyName_(isWildcard(name)), name_(name.getUTF8()), anyNs_(isWildcard(ns)), ns_(ns.getUTF8()), and_(bAnd) {
+        prefixed_ = name_.find(':') != std::string::npos;
+        for (const auto& [k, v] : attrs) attrs_.emplace_back(k.getUTF8(), v.getUTF8());
     }
-    return isWildcard(ns) || GetNamespaceURI() == ns;
+
+    bool operator()(pugi::xml_node n) const {
+        if (!anyName_ && name_ != (prefixed_ ? n.name() : localOf(n.name()))) return false;
+        if (!anyNs_) {
+            std::string uri;
+            lookupNamespace(n, prefixOf(n.name()), uri);
+            if (uri != ns_) return false;
+        }
+        if (attrs_.empty()) return true;
+        for (const auto& [k, v] : attrs_) {
+            pugi::xml_attribute a = n.attribute(k.c_str());
+            bool ok = a && v == a.value();
+            if (ok && !and_) return true;
+            if (!ok && and_) return false;
+        }
+        return and_;
+    }
+
+private:
+    bool anyName_, prefixed_ = false;
+    std::string name_;
+    bool anyNs_;
+    std::string ns_;
+    std::vector<std::pair<std::string, std::string>> attrs_;
+    bool and_;
+};
+
+}  // namespace
+
+bool KElement::MatchesName(const WString& name, const WString& ns) const {
+    return node_ && Matcher(name, ns, JDFAttributeMap(), true)(node_);
 }
 
 bool KElement::MatchesAttributes(const JDFAttributeMap& mAttrib, bool bAnd) const {
-    if (mAttrib.empty()) return true;
-    for (const auto& [key, value] : mAttrib) {
-        bool ok = GetAttribute(key, L"", L"\x1") == value;
-        if (ok && !bAnd) return true;
-        if (!ok && bAnd) return false;
-    }
-    return bAnd;
+    return node_ && Matcher(L"*", L"*", mAttrib, bAnd)(node_);
 }
 
 KElement KElement::GetChildByTagName(const WString& name, const WString& ns, int index,
                                      const JDFAttributeMap& mAttrib, bool bDirect, bool bAnyAttr) const {
     if (!node_ || index < 0) return {};
     int seen = 0;
+    Matcher match(name, ns, mAttrib, !bAnyAttr);
     pugi::xml_node n = node_.first_child();
     while (n) {
         if (n.type() == pugi::node_element) {
-            KElement e = wrap(n);
-            if (e.MatchesName(name, ns) && e.MatchesAttributes(mAttrib, !bAnyAttr) && seen++ == index) return e;
+            if (match(n) && seen++ == index) return wrap(n);
             if (!bDirect && n.first_child()) {
                 n = n.first_child();
                 continue;
@@ -227,12 +265,12 @@ vElement KElement::GetChildrenByTagName(const WString& name, const WString& ns, 
                                         bool bDirect, bool bAnd, int maxSize) const {
     vElement out;
     if (!node_) return out;
+    Matcher match(name, ns, mAttrib, bAnd);
     pugi::xml_node n = node_.first_child();
     while (n) {
         if (n.type() == pugi::node_element) {
-            KElement e = wrap(n);
-            if (e.MatchesName(name, ns) && e.MatchesAttributes(mAttrib, bAnd)) {
-                out.push_back(e);
+            if (match(n)) {
+                out.push_back(wrap(n));
                 if (maxSize > 0 && static_cast<int>(out.size()) >= maxSize) break;
             }
             if (!bDirect && n.first_child()) {
@@ -250,6 +288,7 @@ vElement KElement::GetChildrenByTagName(const WString& name, const WString& ns, 
 vElement KElement::GetChildElementVector(const WString& name, const WString& ns, const JDFAttributeMap& mAttrib,
                                          bool bAnd, int maxSize, bool bResolveTarget) const {
     vElement out;
+    Matcher match(name, ns, mAttrib, bAnd);
     for (pugi::xml_node n = node_.first_child(); n; n = n.next_sibling()) {
         if (n.type() != pugi::node_element) continue;
         KElement e = wrap(n);
@@ -261,7 +300,7 @@ vElement KElement::GetChildElementVector(const WString& name, const WString& ns,
                 if (target) e = wrap(target);
             }
         }
-        if (!e.MatchesName(name, ns) || !e.MatchesAttributes(mAttrib, bAnd)) continue;
+        if (!match(e.node_)) continue;
         out.push_back(e);
         if (maxSize > 0 && static_cast<int>(out.size()) >= maxSize) break;
     }
