@@ -28,6 +28,11 @@ class JDFResource;
 class WString;
 }  // namespace JDF
 
+namespace JDF {  // used by the page-range utility and the writer's helpers
+class JDFSurface;
+class JDFIntegerRangeList;
+}  // namespace JDF
+
 struct LD_JDFHandles;        // the parsed ticket's handles (parser, nodes, resources)
 struct ZippedJDFFileSystem;  // per-job file context and PDF session flag
 struct _kvXmlNode;           // node of the XML document tree
@@ -98,14 +103,45 @@ public:
     bool parseImpInfoFile(const char* path, char** buffer, long* length);
 
     // ---- Page ranges, expansion, die cuts, writer ---------------------------------------------
+    // Page ranges. ConvertPageRangesToPages appends the 0-based positions the page-range text
+    // lists (an empty text gives -1); numbers that overflow are left out, and a range is not
+    // expanded past the position `limit` (values there are ignored by every consumer).
+    void ConvertPageRangesToPages(std::vector<int32_t>& pages, int32_t limit = 10'000'000);
     void applyPageRangeForLayout();
     void applyPageRangeForPDF();
     void applyPageRangeForPDFWithoutVersions();
+    // Packs a page list into ranges of consecutive ascending values (list order kept); 0.
+    LDError convertPagesVecToJDFRangeList(std::vector<int32_t>& pages, JDF::JDFIntegerRangeList& ranges);
+    // Version expansion into run / interpreting-parameter pairs.
     LDError createRunListAndInterpretingParamPairs(bool jobHasTicket);
+    LDError markCurrLayoutOrRunlistAsDefaultVersion(bool mark);
+    void insertVersionedSheetAndSurfaceInLayout(int32_t surfaceIndex, wchar_t* versionName, int32_t versionIndex,
+                                                int64_t copyCount);
+    // Die cuts.
     LDError addDieCut(bool jobHasTicket);
+    LD_Sheet* appendDieSheetInLayout(int32_t surfaceIndex, ContentType type);
+    LDError createDieRunIPPairsAndUpdateDieSurface(LD_Surface* surface, LD_DieCut* dieCut, ContentType type);
+    LDError createDieAndContentIP(int32_t contentObjectIndex, LD_OCG_InterpretingParams* dieParams,
+                                  LD_OCG_InterpretingParams* target);
+    LDError resolveDieLayerNames(LD_PDF* pdf, std::vector<wchar_t*>& layerNames, std::vector<wchar_t*>& sepNames,
+                                 std::vector<wchar_t*>& dieNames, std::vector<wchar_t*>& otherNames);
+    LD_Surface* appendDieSheetAndSurfaceInLayout(int32_t surfaceIndex);
+    LD_Surface* insertDieSheetAndSurfaceInLayout(int32_t contentSurfaceNumber, ContentType type);
+    LD_Surface* findContentSurfaceByOriginalIndex(int32_t n);
+    LD_Signature* getSignatureByIndex(int32_t index);
+    LD_Sheet* getSheetByIndex(int32_t index);
+    LD_Surface* getSurfaceByIndex(int32_t index);
+    LD_ContentObject* getContentObjectByIndex(int32_t index);
+    bool isDie(std::vector<wchar_t*>& names, const wchar_t* name);
+    bool isNested(std::vector<wchar_t*>& names, const wchar_t* name);
     // Appends "key=value" to the job's die-info file in the job folder.
     void AddDieInfoFile(const char* key, int32_t value);
+    // The writer: the new ticket from the job model, saved atomically to outputPath.
     LDError writeJDF(char* outputPath);
+    LDError addObjectListToJDFSurface(JDF::JDFSurface& jdfSurface, LD_Surface* surface);
+    void addSurfaceDieTags(JDF::JDFSurface& jdfSurface, LD_Surface* surface);
+    void addRunDieTags(JDF::JDFRunList& runList, LD_Run* run, bool backSide);
+    void duplicateRunListFiles(JDF::JDFNode& node);
 
     // ---- PDF work -------------------------------------------------------------------------------
     LDError convertAllPDFs();

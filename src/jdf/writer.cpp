@@ -1,4 +1,98 @@
-// Writes the versioned ticket. Not built yet: nothing is written.
-#include "vorlan/LD_JDF.h"
+// The versioned ticket: one Combined process node with rendering and digital-printing
+// parameters, the layout rebuilt from the model, one interpreting-parameter partition and one
+// content (and marks) run-list partition per ordinal, and the output component. Built from the
+// job model alone and saved atomically: a failed write leaves nothing at the output path.
+#include <cstdlib>
+#include <new>
 
-LDError LD_JDF::writeJDF(char*) { return LD_OK; }
+#include "jdf/ticket_writing.h"
+#include "platform/os/text.h"
+
+namespace vorlan::jdf {
+
+const wchar_t* contentTypeText(ContentType type) {
+    switch (type) {
+        case CONTENT_UNDEFINED: return L"Content undefined";
+        case CONTENT_DIE_ONLY: return L"DieOnly";
+        case CONTENT_DIE_WITH_CONTENT: return L"DieWithContent";
+        case CONTENT_CONTENT: return L"Content";
+    }
+    return nullptr;
+}
+
+void setTicketAttribute(JDF::KElement& element, const wchar_t* name, const JDF::WString& value) {
+    element.SetAttribute(JDF::WString(L"KAV_tkt:") + name, value, kTicketExtensionNs);
+}
+
+void setVersionTags(JDF::KElement& element, const wchar_t* name, int32_t index, int64_t copies) {
+    setTicketAttribute(element, L"VersionName", name);
+    setTicketAttribute(element, L"VersionIndex", JDF::WString::valueOf(index));
+    setTicketAttribute(element, L"VersionCopyCount", JDF::WString::valueOf(static_cast<unsigned int>(copies)));
+}
+
+JDF::WString pdfURL(LD_JDF& worker, LD_PDF* pdf) {
+    wchar_t* url = worker.getNativeFilePath(pdf->converted ? pdf->convertedPath : pdf->nativePath);
+    if (!url) throw WriteFailure{};
+    JDF::WString text(url);
+    std::free(url);
+    return text;
+}
+
+}  // namespace vorlan::jdf
+
+namespace {
+
+using namespace vorlan::jdf;
+
+// Builds the whole document; throws WriteFailure (or a JDF layer exception) on the first failure.
+// Returns LD_FAILED when the output component cannot be made.
+LDError buildTicket(LD_JDF& w, JDF::JDFDoc& doc) {
+    JDF::JDFNode root = need(JDF::JDFNode(doc.GetRoot()));
+    root.SetActivation(6);
+    root.SetStatus(3);
+    root.SetType(L"Combined");
+    root.SetTypes(JDF::vWString(L"Imposition Interpreting DigitalPrinting Rendering"));
+    root.SetAttribute(L"xmlns:KAV_tkt", kTicketExtensionNs);
+    root.SetAttribute(L"xmlns:ADBE", kAdobeExtensionNs);
+
+    JDF::JDFRenderingParams rendering = need(root.AppendMatchingResource(L"RenderingParams", 1));
+    rendering.SetInterleaved(true);
+    rendering.SetStatus(7);
+    need(root.AppendMatchingResource(L"DigitalPrintingParams", 1)).SetStatus(7);
+
+    bool layout = writeLayout(w, root);
+    bool interpreting = writeInterpretingParams(w, root);
+    if (!w.contentRuns.empty()) writeContentRunList(w, root);
+    if (!w.markRuns.empty()) writeMarksRunList(w, root);
+
+    if (root.AppendMatchingResource(L"Component", 2).isNull()) return LD_FAILED;
+    if (layout && interpreting) {
+        root.SetTypes(JDF::vWString(L"Imposition Interpreting Rendering DigitalPrinting"));
+    } else if (layout) {
+        root.SetTypes(JDF::vWString(L"Imposition Rendering DigitalPrinting"));
+    } else if (interpreting) {
+        root.SetTypes(JDF::vWString(L"Interpreting Rendering DigitalPrinting"));
+        if (w.m_XMLDieCuts.size() == 1) w.duplicateRunListFiles(root);
+    }
+    return LD_OK;
+}
+
+}  // namespace
+
+LDError LD_JDF::writeJDF(char* outputPath) {
+    LDError result;
+    try {
+        JDF::JDFDoc doc(0);
+        result = buildTicket(*this, doc);
+        if (result == LD_OK && (!outputPath || !doc.Write2File(JDF::WString(vorlan::os::widen(outputPath)))))
+            result = LD_JDF_WRITE_FAILED;
+    } catch (const WriteFailure&) {
+        result = LD_JDF_WRITE_FAILED;
+    } catch (const JDF::JDFException&) {
+        result = LD_JDF_WRITE_FAILED;
+    } catch (const std::bad_alloc&) {
+        result = LD_JDF_WRITE_FAILED;
+    }
+    lastError = result;
+    return result;
+}

@@ -1,0 +1,46 @@
+// The pieces of the versioned-ticket writer (writer.cpp drives them).
+//
+// Every piece builds elements through the JDF layer and throws WriteFailure when the layer hands
+// back a null element, so the first failure ends the write before anything is saved.
+#pragma once
+
+#include "platform/jdf/jdf.h"
+#include "vorlan/LD_JDF.h"
+
+namespace vorlan::jdf {
+
+// Namespaces of the ticket extensions the writer uses.
+inline const wchar_t* const kTicketExtensionNs = L"http://www.vorlan.org/JDF/ticket/1.0";
+inline const wchar_t* const kAdobeExtensionNs = L"http://ns.adobe.com/jdf/1.0/";
+
+struct WriteFailure {};
+
+// The element, or WriteFailure when the layer gave none.
+template <typename Element>
+Element need(Element element) {
+    if (element.isNull()) throw WriteFailure{};
+    return element;
+}
+
+// The KAV_tkt:VersContentType text of a content type; null for a value that has none.
+const wchar_t* contentTypeText(ContentType type);
+
+// Sets a KAV_tkt: attribute.
+void setTicketAttribute(JDF::KElement& element, const wchar_t* name, const JDF::WString& value);
+
+// KAV_tkt:VersionName, VersionIndex and VersionCopyCount (the count as an unsigned 32-bit value).
+void setVersionTags(JDF::KElement& element, const wchar_t* name, int32_t index, int64_t copies);
+
+// The file URL of a PDF: of its converted copy when there is one, else of the file itself.
+JDF::WString pdfURL(LD_JDF& worker, LD_PDF* pdf);
+
+// The Layout resource rebuilt from the model; false when the model has no signature.
+bool writeLayout(LD_JDF& worker, JDF::JDFNode& root);
+// The InterpretingParams resource (one Run partition per ordinal); false when the ordinal table
+// is empty.
+bool writeInterpretingParams(LD_JDF& worker, JDF::JDFNode& root);
+// The content and marks run lists, one Run partition per ordinal.
+void writeContentRunList(LD_JDF& worker, JDF::JDFNode& root);
+void writeMarksRunList(LD_JDF& worker, JDF::JDFNode& root);
+
+}  // namespace vorlan::jdf
