@@ -4,11 +4,16 @@
 // Layout partitioned by SignatureName, SheetName and Side, whose partitions are nested Layouts.
 // The counters of the worker are not reset, so a second Layout continues the numbering.
 #include <cstdlib>
+#include <cstring>
 #include <map>
 #include <memory>
+#include <string_view>
+
+#include <pugixml.hpp>
 
 #include "jdf/ticket_handles.h"
 #include "jdf/ticket_reading.h"
+#include "model/geometry_strings.h"
 #include "platform/os/text.h"
 
 namespace vorlan::jdf {
@@ -27,29 +32,63 @@ bool named(const JDF::KElement& e, const wchar_t* name) {
     return vorlan::os::equalsIgnoreCase(e.GetLocalName().c_str(), name);
 }
 
-bool isTrue(const JDF::KElement& e, const wchar_t* key) {
-    return e.HasAttribute(key) && vorlan::os::equalsIgnoreCase(e.GetAttribute(key).c_str(), L"true");
+// Placed objects are many: they are read straight from the document's UTF-8 bytes, without
+// wide copies of names and values on the way.
+
+// Exact-size wide copy of UTF-8 text.
+wchar_t* copyText(const char* text) {
+    size_t length = std::strlen(text);
+    bool ascii = true;
+    for (size_t i = 0; i < length && ascii; ++i) ascii = static_cast<unsigned char>(text[i]) < 0x80;
+    if (!ascii) return copyText(JDF::WString(text));
+    auto* copy = static_cast<wchar_t*>(std::malloc((length + 1) * sizeof(wchar_t)));
+    if (!copy) throw OutOfText{};
+    for (size_t i = 0; i <= length; ++i) copy[i] = static_cast<wchar_t>(static_cast<unsigned char>(text[i]));
+    return copy;
+}
+
+bool namedNode(pugi::xml_node n, const char* name) {
+    const char* qualified = n.name();
+    const char* colon = std::strchr(qualified, ':');
+    return vorlan::os::equalsIgnoreCaseAscii(colon ? colon + 1 : qualified, name);
+}
+
+// An attribute's value; empty when absent.
+const char* attribute(pugi::xml_node n, const char* key) { return n.attribute(key).value(); }
+
+bool isTrue(pugi::xml_node n, const char* key) {
+    pugi::xml_attribute a = n.attribute(key);
+    return a && vorlan::os::equalsIgnoreCaseAscii(a.value(), "true");
+}
+
+// An Ord value read like _wtoi.
+int32_t readOrd(const char* text) {
+    wchar_t wide[32];
+    size_t i = 0;
+    for (; i + 1 < 32 && text[i]; ++i) wide[i] = static_cast<wchar_t>(static_cast<unsigned char>(text[i]));
+    wide[i] = L'\0';
+    return vorlan::os::wtoi(wide);
 }
 
 // A new matrix with a copy of the text, parsed.
-LD_CTM* readMatrix(const JDF::WString& text) {
+LD_CTM* readMatrix(const char* text) {
     auto ctm = std::make_unique<LD_CTM>();
     ctm->text = copyText(text);
-    LD_JDF::parseStringAsCTM(text, ctm.get());
+    vorlan::geometry::parseCTM(text, ctm.get());
     return ctm.release();
 }
 
-LD_Box* readBox(const JDF::WString& text) {
+LD_Box* readBox(const char* text) {
     auto box = std::make_unique<LD_Box>();
     box->text = copyText(text);
-    LD_JDF::parseStringAsBox(text, box.get());
+    vorlan::geometry::parseBox(text, box.get());
     return box.release();
 }
 
 // The first point of the text, carrying the text; (-1, -1) without text when there is none.
-LD_Point* readTrimSize(const JDF::WString& text) {
+LD_Point* readTrimSize(const char* text) {
     std::vector<LD_Point*> points;
-    LD_JDF::parseStringAsPoints(text, points);
+    vorlan::geometry::parsePoints(text, points);
     if (points.empty()) return new LD_Point;
     for (size_t i = 1; i < points.size(); ++i) delete points[i];
     std::unique_ptr<LD_Point> first(points[0]);
@@ -137,13 +176,13 @@ private:
             vorlan::os::equalsIgnoreCase(resource.GetAttribute(L"ADBE:StepAndRepeat").c_str(), L"true"))
             surface->StepAndRepeat = true;
 
-        JDF::vElement children = element.GetChildrenByTagName(L"*", L"*");
-        surface->isEmpty = children.empty();
         ords_.clear();
         repeated_ = false;
-        for (const JDF::KElement& child : children) {
-            if (named(child, L"ContentObject")) readContentObject(child, *surface);
-            else if (named(child, L"MarkObject")) readMarkObject(child, *surface);
+        for (pugi::xml_node child = element.node().first_child(); child; child = child.next_sibling()) {
+            if (child.type() != pugi::node_element) continue;
+            surface->isEmpty = false;
+            if (namedNode(child, "ContentObject")) readContentObject(child, *surface);
+            else if (namedNode(child, "MarkObject")) readMarkObject(child, *surface);
             ++w_.placedObjectCount;
         }
         if (repeated_) markFirstOccurrences(*surface);
@@ -160,7 +199,7 @@ private:
         }
     }
 
-    void readContentObject(const JDF::KElement& element, LD_Surface& surface) {
+    void readContentObject(pugi::xml_node element, LD_Surface& surface) {
         auto* object = new LD_ContentObject;
         w_.contentObjects.push_back(object);
         surface.contentObjects.push_back(object);
@@ -168,20 +207,20 @@ private:
         object->contentObjectIndex = w_.contentObjectCount;
         object->surfaceIndex = surface.index;
 
-        JDF::WString ctm = element.GetAttribute(L"CTM");
+        const char* ctm = attribute(element, "CTM");
         object->CTM->text = copyText(ctm);
-        LD_JDF::parseStringAsCTM(ctm, object->CTM);
-        JDF::WString clipBox = element.GetAttribute(L"ClipBox");
-        if (!clipBox.empty()) object->ClipBox = readBox(clipBox);
-        JDF::WString clipPath = element.GetAttribute(L"ClipPath");
-        if (clipPath.empty()) clipPath = element.GetAttribute(L"SourceClipPath");
-        if (!clipPath.empty()) {
+        vorlan::geometry::parseCTM(ctm, object->CTM);
+        const char* clipBox = attribute(element, "ClipBox");
+        if (*clipBox) object->ClipBox = readBox(clipBox);
+        const char* clipPath = attribute(element, "ClipPath");
+        if (!*clipPath) clipPath = attribute(element, "SourceClipPath");
+        if (*clipPath) {
             object->clipPathText = copyText(clipPath);
             object->ClipPath = new std::vector<LD_ClipPathOperations*>;
-            LD_JDF::parseStringAsClipPathOperations(clipPath, *object->ClipPath);
+            vorlan::geometry::parseClipPath(clipPath, *object->ClipPath);
         }
 
-        object->Ord = vorlan::os::wtoi(element.GetAttribute(L"Ord").c_str());
+        object->Ord = readOrd(attribute(element, "Ord"));
         auto [it, added] = ords_.emplace(object->Ord, false);
         if (!added) {
             it->second = true;
@@ -189,18 +228,18 @@ private:
             repeated_ = true;
         }
 
-        JDF::WString trimCtm = element.GetAttribute(L"TrimCTM");
-        if (!trimCtm.empty()) object->TrimCTM = readMatrix(trimCtm);
-        JDF::WString trimSize = element.GetAttribute(L"TrimSize");
-        if (!trimSize.empty()) object->TrimSize = readTrimSize(trimSize);
-        object->CachePlacedObject = isTrue(element, L"ADBE:CachePlacedObject");
-        object->IgnoreClipForReuse = isTrue(element, L"ADBE:IgnoreClipForReuse");
+        const char* trimCtm = attribute(element, "TrimCTM");
+        if (*trimCtm) object->TrimCTM = readMatrix(trimCtm);
+        const char* trimSize = attribute(element, "TrimSize");
+        if (*trimSize) object->TrimSize = readTrimSize(trimSize);
+        object->CachePlacedObject = isTrue(element, "ADBE:CachePlacedObject");
+        object->IgnoreClipForReuse = isTrue(element, "ADBE:IgnoreClipForReuse");
 
         w_.contentObjectOrdinalMap.push_back({object->Ord, object->contentObjectIndex});
         ++w_.contentObjectCount;
     }
 
-    void readMarkObject(const JDF::KElement& element, LD_Surface& surface) {
+    void readMarkObject(pugi::xml_node element, LD_Surface& surface) {
         auto* object = new LD_MarkObject;
         w_.markObjects.push_back(object);
         surface.markObjects.push_back(object);
@@ -208,16 +247,16 @@ private:
         object->markObjectIndex = w_.markObjectCount;
         object->surfaceIndex = surface.index;
 
-        JDF::WString ctm = element.GetAttribute(L"CTM");
+        const char* ctm = attribute(element, "CTM");
         object->CTM->text = copyText(ctm);
-        LD_JDF::parseStringAsCTM(ctm, object->CTM);
-        JDF::WString clipBox = element.GetAttribute(L"ClipBox");
-        if (!clipBox.empty()) object->ClipBox = readBox(clipBox);
-        object->Ord = vorlan::os::wtoi(element.GetAttribute(L"Ord").c_str());
-        JDF::WString trimCtm = element.GetAttribute(L"TrimCTM");
-        if (!trimCtm.empty()) object->TrimCTM = readMatrix(trimCtm);
-        JDF::WString trimSize = element.GetAttribute(L"TrimSize");
-        if (!trimSize.empty()) object->TrimSize = readTrimSize(trimSize);
+        vorlan::geometry::parseCTM(ctm, object->CTM);
+        const char* clipBox = attribute(element, "ClipBox");
+        if (*clipBox) object->ClipBox = readBox(clipBox);
+        object->Ord = readOrd(attribute(element, "Ord"));
+        const char* trimCtm = attribute(element, "TrimCTM");
+        if (*trimCtm) object->TrimCTM = readMatrix(trimCtm);
+        const char* trimSize = attribute(element, "TrimSize");
+        if (*trimSize) object->TrimSize = readTrimSize(trimSize);
         ++w_.markObjectCount;
     }
 

@@ -3,7 +3,6 @@
 
 #include <charconv>
 #include <cstring>
-#include <memory>
 #include <string>
 #include <string_view>
 
@@ -29,9 +28,7 @@ double readNumber(std::string_view token) {
 
 // Calls fn for each token of the narrowed text, split at single space characters only.
 template <typename Fn>
-void forEachToken(const JDF::WString& text, Fn fn) {
-    std::string narrow = vorlan::os::narrow(text.c_str());
-    std::string_view rest(narrow);
+void forEachToken(std::string_view rest, Fn fn) {
     while (!rest.empty()) {
         size_t space = rest.find(' ');
         std::string_view token = rest.substr(0, space);
@@ -107,38 +104,50 @@ LD_ClipPathOperands* makeOperands(int op, const std::vector<double>& n) {
 
 }  // namespace
 
-std::vector<double>* LD_JDF::splitIntoFloatTokensBySpace(const JDF::WString& text) {
-    auto* numbers = new std::vector<double>;
-    forEachToken(text, [&](std::string_view token) { numbers->push_back(readNumber(token)); });
-    return numbers;
-}
+namespace vorlan::geometry {
 
-void LD_JDF::parseStringAsPoints(const JDF::WString& text, std::vector<LD_Point*>& points) {
-    std::unique_ptr<std::vector<double>> numbers(splitIntoFloatTokensBySpace(text));
-    for (size_t i = 0; i + 1 < numbers->size(); i += 2) {
+void parsePoints(std::string_view text, std::vector<LD_Point*>& points) {
+    double x = 0;
+    bool haveX = false;
+    forEachToken(text, [&](std::string_view token) {
+        double value = readNumber(token);
+        if (!haveX) {
+            x = value;
+            haveX = true;
+            return;
+        }
         auto* point = new LD_Point;
-        point->x = (*numbers)[i];
-        point->y = (*numbers)[i + 1];
+        point->x = x;
+        point->y = value;
         points.push_back(point);
-    }
+        haveX = false;
+    });
 }
 
-void LD_JDF::parseStringAsBox(const JDF::WString& text, LD_Box* box) {
-    std::unique_ptr<std::vector<double>> numbers(splitIntoFloatTokensBySpace(text));
-    if (!box || numbers->size() < 4) return;
-    // Numbers after the fourth cycle through the fields again.
-    double* fields[4] = {&box->lowerLeft.x, &box->lowerLeft.y, &box->upperRight.x, &box->upperRight.y};
-    for (size_t i = 0; i < numbers->size(); ++i) *fields[i % 4] = (*numbers)[i];
+void parseBox(std::string_view text, LD_Box* box) {
+    // Numbers after the fourth cycle through the fields again: the last one of each cycle stays.
+    double fields[4] = {};
+    size_t count = 0;
+    forEachToken(text, [&](std::string_view token) { fields[count++ % 4] = readNumber(token); });
+    if (!box || count < 4) return;
+    box->lowerLeft.x = fields[0];
+    box->lowerLeft.y = fields[1];
+    box->upperRight.x = fields[2];
+    box->upperRight.y = fields[3];
 }
 
-void LD_JDF::parseStringAsCTM(const JDF::WString& text, LD_CTM* ctm) {
-    std::unique_ptr<std::vector<double>> numbers(splitIntoFloatTokensBySpace(text));
-    if (!ctm || numbers->size() < 6) return;
-    const std::vector<double>& n = *numbers;
+void parseCTM(std::string_view text, LD_CTM* ctm) {
+    double n[6] = {};
+    size_t count = 0;
+    forEachToken(text, [&](std::string_view token) {
+        if (count < 6) n[count] = readNumber(token);
+        ++count;
+    });
+    if (!ctm || count < 6) return;
     ctm->a = n[0], ctm->b = n[1], ctm->c = n[2], ctm->d = n[3], ctm->e = n[4], ctm->f = n[5];
 }
 
-bool LD_JDF::parseStringAsClipPathOperations(const JDF::WString& text, std::vector<LD_ClipPathOperations*>& ops) {
+bool parseClipPath(std::string_view text, std::vector<LD_ClipPathOperations*>& ops) {
     bool wellFormed = true;
     std::vector<double> pending;
     forEachToken(text, [&](std::string_view token) {
@@ -160,6 +169,31 @@ bool LD_JDF::parseStringAsClipPathOperations(const JDF::WString& text, std::vect
         pending.clear();
     });
     return wellFormed;
+}
+
+}  // namespace vorlan::geometry
+
+// The wide forms narrow the text with the current locale first; geometry text is ASCII.
+std::vector<double>* LD_JDF::splitIntoFloatTokensBySpace(const JDF::WString& text) {
+    auto* numbers = new std::vector<double>;
+    forEachToken(vorlan::os::narrow(text.c_str()), [&](std::string_view token) { numbers->push_back(readNumber(token)); });
+    return numbers;
+}
+
+void LD_JDF::parseStringAsPoints(const JDF::WString& text, std::vector<LD_Point*>& points) {
+    vorlan::geometry::parsePoints(vorlan::os::narrow(text.c_str()), points);
+}
+
+void LD_JDF::parseStringAsBox(const JDF::WString& text, LD_Box* box) {
+    vorlan::geometry::parseBox(vorlan::os::narrow(text.c_str()), box);
+}
+
+void LD_JDF::parseStringAsCTM(const JDF::WString& text, LD_CTM* ctm) {
+    vorlan::geometry::parseCTM(vorlan::os::narrow(text.c_str()), ctm);
+}
+
+bool LD_JDF::parseStringAsClipPathOperations(const JDF::WString& text, std::vector<LD_ClipPathOperations*>& ops) {
+    return vorlan::geometry::parseClipPath(vorlan::os::narrow(text.c_str()), ops);
 }
 
 bool LD_JDF::isMarkPresent(const wchar_t* text) {

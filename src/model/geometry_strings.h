@@ -5,6 +5,9 @@
 // deleted through the base class; clone() copies the numbers and each point's text anew.
 #pragma once
 
+#include <string_view>
+#include <vector>
+
 #include "vorlan/LD_Records.h"
 
 // moveto, lineto: one point.
@@ -36,3 +39,12 @@ public:
     double height = 0;
     LD_ClipPathOperands* clone() const override { return new LD_ClipPathOperandsOnePointWidthHeight(*this); }
 };
+
+// The geometry parsers on narrow (ASCII / UTF-8) text, for readers that hold the document's own
+// bytes; LD_JDF::parseStringAs... narrow their wide text and call these.
+namespace vorlan::geometry {
+void parsePoints(std::string_view text, std::vector<LD_Point*>& points);
+void parseBox(std::string_view text, LD_Box* box);
+void parseCTM(std::string_view text, LD_CTM* ctm);
+bool parseClipPath(std::string_view text, std::vector<LD_ClipPathOperations*>& ops);
+}  // namespace vorlan::geometry
