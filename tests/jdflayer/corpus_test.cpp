@@ -172,6 +172,9 @@ TEST(JdfParser, DeeplyNestedInputIsHandledWithoutRecursion) {
     EXPECT_TRUE(deepest.IsResource(true));
     EXPECT_EQ(deepest.GetStatus(), 7);
     EXPECT_EQ(deepest.GetResourceRoot().GetID(), L"deep");
+    deepest.SetAttribute(L"Run", L"7");
+    EXPECT_EQ(deepest.GetResourceRoot().GetPartition(JDFAttributeMap(L"Run", L"7")), KElement(deepest));
+    EXPECT_TRUE(deepest.GetResourceRoot().GetPartition(JDFAttributeMap(L"Run", L"8")).isNull());
     JDFDoc other(0);
     KElement copy = other.GetJDFRoot().GetResourcePool().CopyElement(root.GetResourcePool().GetElement(L"RunList"));
     EXPECT_EQ(copy.GetNamespaceURIFromPrefix(L"eg"), L"urn:eg");

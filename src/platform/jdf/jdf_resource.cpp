@@ -1,6 +1,10 @@
 // Resources: inherited attributes, status, partitions, links and pools.
 #include "platform/jdf/jdf_resource.h"
 
+#include <cstring>
+#include <string>
+#include <vector>
+
 #include "platform/jdf/enum_tables.h"
 
 namespace JDF {
@@ -127,15 +131,33 @@ JDFResource JDFResource::AddPartition(int partIDKey, const WString& value) {
 JDFResource JDFResource::GetPartition(const JDFAttributeMap& partMap) const {
     if (isNull()) return {};
     if (partMap.empty()) return *this;
-    vElement all = GetChildrenByTagName(GetNodeName(), L"", JDFAttributeMap(), false);
-    for (const KElement& e : all) {
-        JDFAttributeMap have = JDFResource(e).GetPartMap();
-        bool ok = true;
-        for (const auto& [k, v] : partMap) {
-            auto it = have.find(k);
-            if (it == have.end() || it->second != v) { ok = false; break; }
-        }
-        if (ok) return e;
+    // Depth-first over the partitions below, carrying the inherited value of each wanted key.
+    std::vector<std::string> keys, wanted;
+    for (const auto& [k, v] : partMap) {
+        keys.push_back(k.getUTF8());
+        wanted.push_back(v.getUTF8());
+    }
+    struct Item {
+        pugi::xml_node node;
+        std::vector<std::string> values;
+    };
+    auto valuesOf = [&](pugi::xml_node n, std::vector<std::string> values) {
+        for (size_t i = 0; i < keys.size(); ++i)
+            if (pugi::xml_attribute a = n.attribute(keys[i].c_str())) values[i] = a.value();
+        return values;
+    };
+    const char* name = node_.name();
+    std::vector<Item> stack;
+    std::vector<std::string> own = valuesOf(node_, std::vector<std::string>(keys.size(), std::string(1, '\x1')));
+    for (pugi::xml_node c = node_.last_child(); c; c = c.previous_sibling())
+        if (c.type() == pugi::node_element && std::strcmp(c.name(), name) == 0) stack.push_back({c, own});
+    while (!stack.empty()) {
+        Item item = std::move(stack.back());
+        stack.pop_back();
+        item.values = valuesOf(item.node, std::move(item.values));
+        if (item.values == wanted) return KElement(item.node, doc_);
+        for (pugi::xml_node c = item.node.last_child(); c; c = c.previous_sibling())
+            if (c.type() == pugi::node_element && std::strcmp(c.name(), name) == 0) stack.push_back({c, item.values});
     }
     return {};
 }
