@@ -168,7 +168,7 @@ bool JDFNode::IsValid(int level) const {
     if (isNull() || GetLocalName() != L"JDF") return false;
     if (level < 1) return true;
     if (!HasAttribute(L"ID") || !HasAttribute(L"Type")) return false;
-    if (level >= 3 && !HasAttribute(L"JobPartID")) return false;
+    if (level >= 3 && !HasAttribute(L"Status")) return false;
     if (level >= 5) {
         for (const KElement& pool : GetChildrenByTagName(L"ResourceLinkPool", L"", JDFAttributeMap(), false))
             for (const KElement& link : pool.GetChildrenByTagName())

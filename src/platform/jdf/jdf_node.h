@@ -54,8 +54,9 @@ public:
     // This node's link to r; null when none.
     JDFResourceLink GetLink(const JDFResource& r) const;
 
-    // Structural check: level 0 accepts any JDF element; from level 1 the node needs a JDF
-    // name, ID, Type, and JobPartID (level 3+); from level 5 every link's rRef must resolve.
+    // Structural check: level 0 accepts any JDF element; from level 1 the node needs ID and
+    // Type, from level 3 also Status (the attributes the schema requires), and from level 5
+    // every resource link in the node and its descendants must name an existing ID.
     bool IsValid(int level = 5) const;
 };
 
