@@ -170,7 +170,7 @@ private:
         place(surface->isFront ? sheet.front : sheet.back, surface);
         w_.surfaces.push_back(surface);
 
-        surface->SurfaceContentsBox = new LD_Box;
+        if (!surface->SurfaceContentsBox) surface->SurfaceContentsBox = new LD_Box;  // made with the surface
         LD_JDF::parseStringAsBox(resource.GetAttribute(L"SurfaceContentsBox"), surface->SurfaceContentsBox);
         if (resource.HasAttribute(L"ADBE:StepAndRepeat") &&
             vorlan::os::equalsIgnoreCase(resource.GetAttribute(L"ADBE:StepAndRepeat").c_str(), L"true"))
