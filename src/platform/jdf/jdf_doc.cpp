@@ -17,7 +17,7 @@
 namespace JDF {
 namespace {
 
-const char* const kIndent = "  ";
+const char* const kIndent = "\t";
 // Indentation grows with depth, so output of a deeply nested tree would grow with the square of
 // its depth: beyond this depth documents are written without indentation.
 constexpr int kMaxIndentedDepth = 100;
@@ -99,7 +99,8 @@ bool XMLDoc::Write2File(const WString& fileName) const {
     std::string tmp = target + ".XXXXXX";
     int fd = ::mkstemp(tmp.data());
     if (fd < 0) return false;
-    // mkstemp creates 0600: keep the mode of the file being replaced, else rw-r--r--.
+    // mkstemp creates 0600: keep the mode of the file being replaced, else rw-r--r--. The data
+    // reaches the disk (fsync) before the rename makes it the ticket.
     struct stat st {};
     ::fchmod(fd, ::stat(target.c_str(), &st) == 0 ? (st.st_mode & 07777) : 0644);
     FdWriter writer(fd);

@@ -16,7 +16,7 @@ public:
     bool isNull() const { return !doc_; }
     // The root element; null for an empty or null document.
     KElement GetRoot() const;
-    // Writes the document (UTF-8, two-space indentation — none for trees nested deeper than 100
+    // Writes the document (UTF-8, tab indentation — none for trees nested deeper than 100
     // levels, whose indentation would outgrow the content —, deterministic bytes) to a temporary
     // file in the target's folder and renames it over the target, so a failed or interrupted
     // write never leaves a partial file. Returns false (target untouched) on any failure.
