@@ -141,3 +141,21 @@ TEST(CorpusTickets, CountsMatchXPathForTicketsWithPlacedObjects) {
 }
 
 }  // namespace
+
+namespace {
+
+// vorlan inspect --json prints the reader's view without the timing line.
+TEST(CorpusTickets, InspectCommandPrintsTheQueryView) {
+    VORLAN_REQUIRE_CORPUS();
+    const char* cli = std::getenv("VORLAN_CLI");
+    if (!cli || !*cli) GTEST_SKIP() << "VORLAN_CLI not set; skipping";
+    std::string out;
+    fs::path file = vorlan::test::corpusDir() / "jdf" / "libjzip_40pages-8up.jdf";
+    EXPECT_EQ(vorlan::test::runCommand(std::string(cli) + " inspect --json '" + file.string() + "'", &out), 0);
+    EXPECT_EQ(out.rfind("{", 0), 0u) << out.substr(0, 200);
+    EXPECT_NE(out.find(R"("contentObjectCount": 40)"), std::string::npos);
+    EXPECT_NE(out.find(R"("markObjectCount": 12)"), std::string::npos);
+    EXPECT_EQ(out.find("Total initialization time"), std::string::npos);
+}
+
+}  // namespace
