@@ -57,6 +57,9 @@ TEST(JdfCreate, NodeSettersWriteTheTokensOfTheirNumbers) {
     EXPECT_EQ(root.GetAttribute(L"xsi:type"), L"Combined");
     EXPECT_EQ(root.GetNamespaceURIFromPrefix(L"xsi"), L"http://www.w3.org/2001/XMLSchema-instance");
     EXPECT_EQ(root.GetAttribute(L"Types"), L"Imposition Interpreting DigitalPrinting Rendering");
+    JDFNode(root).SetType(L"Imposition");
+    EXPECT_FALSE(root.HasAttribute(L"xsi:type"));
+    root.SetType(L"Combined");
     EXPECT_THROW(root.SetActivation(0), JDFException);
     EXPECT_THROW(root.SetStatus(15), JDFException);
     root.SetAttribute(L"N", 5);

@@ -61,6 +61,7 @@ std::vector<JDFResourceLink> matchingLinks(const JDFNode& node, const WString& n
 void JDFNode::SetType(const WString& type) {
     SetAttribute(L"Type", type);
     if (type == L"Combined" || type == L"ProcessGroup") SetAttribute(L"xsi:type", type, kXsiNamespace);
+    else RemoveAttribute(L"xsi:type");  // a stale one would contradict Type
 }
 
 int JDFNode::GetActivation(bool bInherit) const {

@@ -17,7 +17,7 @@ public:
     WString GetType() const { return GetAttribute(L"Type"); }
     // Types as a list (empty when absent).
     vWString GetTypes() const { return vWString(GetAttribute(L"Types")); }
-    // Writes Type, and for the process types of the JDF schema also xsi:type.
+    // Writes Type; for Combined and ProcessGroup also xsi:type (removed for other types).
     void SetType(const WString& type);
     void SetTypes(const vWString& types) { SetAttribute(L"Types", types.GetString()); }
     // Node activation (6 Active); a missing attribute reads Active. With bInherit the lowest
