@@ -1,0 +1,179 @@
+// Generated layer-mode jobs (see job_builder.h).
+#include "job_builder.h"
+
+#include <cstdlib>
+#include <cstring>
+#include <sstream>
+
+#include "test_support.h"
+#include "vorlan/LD_JDF.h"
+#include "vorlan/vorlan.h"
+
+namespace fs = std::filesystem;
+
+namespace layermode_test {
+
+namespace {
+
+std::string runPartitions(const std::string& pdf, int pages, bool perPage) {
+    std::ostringstream x;
+    auto partition = [&](int run, const std::string& range) {
+        x << "      <RunList Run=\"" << run << "\" Pages=\"" << range << "\">\n"
+          << "        <LayoutElement><FileSpec URL=\"" << pdf << "\" MimeType=\"application/pdf\"/></LayoutElement>\n"
+          << "      </RunList>\n";
+    };
+    if (perPage)
+        for (int p = 0; p < pages; ++p) partition(p, std::to_string(p));
+    else
+        partition(0, pages > 1 ? "0 ~ " + std::to_string(pages - 1) : "0");
+    return x.str();
+}
+
+struct Host {
+    fs::path folder;
+    int counter = 0;
+};
+
+// The host names each new PDF the library asks for in the job's out folder.
+int newPdfPath(char* buffer, int size, void* userData) {
+    auto* host = static_cast<Host*>(userData);
+    std::snprintf(buffer, static_cast<size_t>(size), "%s/out-%d.pdf", host->folder.c_str(), host->counter++);
+    return 0;
+}
+
+}  // namespace
+
+std::string ticketXml(const TicketSpec& spec) {
+    const int surfacesPerSheet = spec.twoSided ? 2 : 1;
+    const int objects = spec.sheets * surfacesPerSheet * spec.objectsPerSurface;
+    const int files = static_cast<int>(spec.pdfs.size());
+    std::ostringstream x;
+    x << "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
+      << "<JDF xmlns=\"http://www.CIP4.org/JDFSchema_1_1\" ID=\"n1\" JobPartID=\"n1\" Type=\"Imposition\""
+         " Status=\"Waiting\" Version=\"1.3\">\n  <ResourcePool>\n";
+    // The content objects take the pages of the PDFs in turn, in blocks, so that content object
+    // k shows logical page (ordinal) k.
+    x << "    <RunList ID=\"rDoc\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n";
+    if (files == 1) {
+        x << runPartitions(spec.pdfs[0], objects, spec.pagePartitions);
+    } else {
+        for (int f = 0; f < files; ++f) {
+            int pages = objects / files + (f < objects % files ? 1 : 0);
+            x << "      <RunList Run=\"" << f << "\" Pages=\"" << (pages > 1 ? "0 ~ " + std::to_string(pages - 1) : "0")
+              << "\"><LayoutElement><FileSpec URL=\"" << spec.pdfs[static_cast<size_t>(f)]
+              << "\" MimeType=\"application/pdf\"/></LayoutElement></RunList>\n";
+        }
+    }
+    x << "    </RunList>\n";
+    if (spec.marks)
+        x << "    <RunList ID=\"rMarks\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n"
+          << runPartitions("marks.pdf", 1, false) << "    </RunList>\n";
+    x << "    <Layout ID=\"rLayout\" Class=\"Parameter\" Status=\"Available\">\n"
+      << "      <Signature Name=\"Sig1\">\n";
+    int object = 0;
+    for (int s = 0; s < spec.sheets; ++s) {
+        x << "        <Sheet Name=\"Sheet" << s + 1 << "\">\n";
+        if (spec.sheetMedia) x << "          <Media Dimension=\"600 800\" MediaType=\"Paper\"/>\n";
+        for (int side = 0; side < surfacesPerSheet; ++side) {
+            x << "          <Surface Side=\"" << (side ? "Back" : "Front") << "\""
+              << (spec.surfaceBoxes ? " SurfaceContentsBox=\"0 0 600 800\"" : "") << ">\n";
+            for (int o = 0; o < spec.objectsPerSurface; ++o) {
+                if (spec.marks && o == 1) x << "            <MarkObject CTM=\"1 0 0 1 0 0\" Ord=\"0\"/>\n";
+                x << "            <ContentObject CTM=\"1 0 0 1 " << 10 * o << " 0\" Ord=\"" << object
+                  << "\" ClipBox=\"0 0 300 400\" TrimSize=\"300 400\"/>\n";
+                ++object;
+            }
+            if (spec.marks && spec.objectsPerSurface < 2) x << "            <MarkObject CTM=\"1 0 0 1 0 0\" Ord=\"0\"/>\n";
+            if (spec.extraOrd >= 0 && s == 0 && side == 0)
+                x << "            <ContentObject CTM=\"1 0 0 1 0 0\" Ord=\"" << spec.extraOrd << "\"/>\n";
+            x << "          </Surface>\n";
+        }
+        x << "        </Sheet>\n";
+    }
+    x << "      </Signature>\n    </Layout>\n  </ResourcePool>\n  <ResourceLinkPool>\n"
+      << "    <RunListLink rRef=\"rDoc\" Usage=\"Input\" ProcessUsage=\"Document\"/>\n";
+    if (spec.marks) x << "    <RunListLink rRef=\"rMarks\" Usage=\"Input\" ProcessUsage=\"Marks\"/>\n";
+    x << "    <LayoutLink rRef=\"rLayout\" Usage=\"Input\"/>\n  </ResourceLinkPool>\n</JDF>\n";
+    return x.str();
+}
+
+std::string descriptionXml(const std::vector<LayerSpec>& layers, const std::vector<VersionSpec>& versions,
+                           const DieSpec* die, bool exportVersions, bool layerMode) {
+    std::ostringstream x;
+    x << "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<OptionalContentGroupData DefaultLayerMode=\""
+      << (layerMode ? "true" : "false") << "\"" << (exportVersions ? " export=\"true\"" : "") << ">\n";
+    for (const LayerSpec& l : layers)
+        x << "  <OptionalLayer pdfIndex=\"" << l.pdfIndex << "\" OCGName=\"" << l.name << "\" displayName=\"" << l.name
+          << "\" isSep=\"" << (l.isSep ? "true" : "false") << "\" isNested=\"false\" default=\""
+          << (l.on ? "true" : "false") << "\"/>\n";
+    if (!versions.empty()) {
+        x << "  <Versions>\n";
+        for (const VersionSpec& v : versions) {
+            x << "    <Version name=\"" << v.name << "\" enable=\"" << (v.enabled ? "true" : "false") << "\" copies=\""
+              << v.copies << "\">\n";
+            for (const SurfaceSwitch& s : v.surfaces) {
+                x << "      <Surface index=\"" << s.index << "\">";
+                for (const ContentSwitch& c : s.objects)
+                    x << "<ContentObject index=\"" << c.index << "\" LayerNameOn=\"" << c.layerOn << "\" LayerNameOff=\""
+                      << c.layerOff << "\" SepNameOn=\"" << c.sepOn << "\" SepNameOff=\"" << c.sepOff << "\"/>";
+                x << "</Surface>\n";
+            }
+            x << "    </Version>\n";
+        }
+        x << "  </Versions>\n";
+    }
+    if (die) {
+        x << "  <DieCut name=\"Die\" enable=\"" << (die->enable ? "true" : "false") << "\">\n";
+        for (int i = 0; i < die->count; ++i)
+            x << "    <Surface index=\"0\" dieLayerInternalNames=\"" << die->layers << "\" dieSepInternalNames=\""
+              << die->seps << "\"/>\n";
+        x << "  </DieCut>\n";
+    }
+    x << "</OptionalContentGroupData>\n";
+    return x.str();
+}
+
+Job writeTicketJob(const fs::path& root, const TicketSpec& spec, const std::string& description) {
+    Job job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo", root / "out.jdf"};
+    vorlan::test::writeFile(job.dataFile, "data file of job 1\n");
+    vorlan::test::writeFile(job.dataFolder / "ticket.jdf", ticketXml(spec));
+    for (const std::string& pdf : spec.pdfs) vorlan::test::writeFile(job.dataFolder / pdf, vorlan::test::minimalPdf());
+    if (spec.marks) vorlan::test::writeFile(job.dataFolder / "marks.pdf", vorlan::test::minimalPdf());
+    if (!description.empty()) vorlan::test::writeFile(job.description, description);
+    return job;
+}
+
+Job writeBarePdfJob(const fs::path& root, const std::string& description) {
+    Job job{root, root / "job1.pdf", root, root / "job1.impinfo", root / "out.jdf"};
+    vorlan::test::writeFile(job.dataFile, vorlan::test::minimalPdf());
+    if (!description.empty()) vorlan::test::writeFile(job.description, description);
+    return job;
+}
+
+int consume(const Job& job, const char* pageRange) {
+    std::string output = job.output.string();
+    std::string description = job.description.string();
+    Host host{job.root / "out"};
+    fs::create_directories(host.folder);
+    return vorlan_consume_job(job.dataFile.c_str(), fs::exists(job.description) ? description.c_str() : nullptr,
+                              output.data(), job.root.c_str(), pageRange, nullptr, newPdfPath, &host);
+}
+
+void setJobAttribute(const char* name, const char* value) {
+    LD_JDF worker;
+    worker.jobNumber = 1;
+    worker.setJobAttribute(name, value);
+}
+
+std::string schemaErrors(const std::vector<fs::path>& tickets) {
+    fs::path xsd = vorlan::test::corpusDir() / "jdf-schema" / "xmllint-patched" / "JDF_1.8" / "JDF.xsd";
+    if (!fs::exists(xsd)) return "schema not found: " + xsd.string();
+    if (!vorlan::test::haveProgram("xmllint")) return "xmllint (libxml2-utils) is needed to check the schema";
+    std::string files;
+    for (const fs::path& t : tickets) files += " '" + t.string() + "'";
+    std::string output;
+    int rc = vorlan::test::runCommand("xmllint --noout --schema '" + xsd.string() + "'" + files + " 2>&1", &output);
+    return rc == 0 ? std::string() : output;
+}
+
+}  // namespace layermode_test
