@@ -147,8 +147,7 @@ namespace {
 // vorlan inspect --json prints the reader's view without the timing line.
 TEST(CorpusTickets, InspectCommandPrintsTheQueryView) {
     VORLAN_REQUIRE_CORPUS();
-    const char* cli = std::getenv("VORLAN_CLI");
-    if (!cli || !*cli) GTEST_SKIP() << "VORLAN_CLI not set; skipping";
+    const char* cli = VORLAN_CLI_PATH;
     std::string out;
     fs::path file = vorlan::test::corpusDir() / "jdf" / "libjzip_40pages-8up.jdf";
     EXPECT_EQ(vorlan::test::runCommand(std::string(cli) + " inspect --json '" + file.string() + "'", &out), 0);
