@@ -145,6 +145,9 @@ public:
 
     // ---- PDF work -------------------------------------------------------------------------------
     LDError convertAllPDFs();
+    // PDF conversion for versions: separations that the first version switches off, and the die
+    // separations of a single die cut, each once (case ignored); the names stay the model's.
+    void getListOfSeparationsToBeConverted(std::vector<wchar_t*>& names);
     int32_t getFileIndexInZip(const char* name);
 
     // ---- Queries ----------------------------------------------------------------------------------

@@ -59,13 +59,19 @@ ColourSpaceRef deviceColourSpace(const std::string& name) {
     return nullptr;
 }
 
+static bool isAbbreviation(const std::string& name) { return name == "/G" || name == "/RGB" || name == "/CMYK"; }
+
 ColourSpaceRef ColourSpaceResolver::byName(const std::string& name) {
-    if (ColourSpaceRef device = deviceColourSpace(name)) return device;
+    if (!isAbbreviation(name))
+        if (ColourSpaceRef device = deviceColourSpace(name)) return device;
     auto it = byName_.find(name);
     if (it != byName_.end()) return it->second;
     ColourSpaceRef cs;
     try {
+        // /G, /RGB and /CMYK are resource names like any other; only where no such resource
+        // exists are they read as the inline-image abbreviations.
         cs = resource(name, 0);
+        if (cs->family == ColourFamily::Unknown && isAbbreviation(name)) cs = deviceColourSpace(name);
     } catch (const std::exception&) {
         cs = unknownSpace();
     }
@@ -74,7 +80,8 @@ ColourSpaceRef ColourSpaceResolver::byName(const std::string& name) {
 }
 
 ColourSpaceRef ColourSpaceResolver::resource(const std::string& name, int depth) {
-    if (ColourSpaceRef device = deviceColourSpace(name)) return device;
+    if (!isAbbreviation(name) || depth > 0)
+        if (ColourSpaceRef device = deviceColourSpace(name)) return device;
     if (depth > kMaxDepth || !resources_.isDictionary()) return unknownSpace();
     QPDFObjectHandle dict = resources_.getKey("/ColorSpace");
     QPDFObjectHandle entry = dict.isDictionary() ? dict.getKey(name) : QPDFObjectHandle::newNull();

@@ -124,25 +124,30 @@ QPDFObjectHandle ContentEditor::ownResources() {
     return resources;
 }
 
-std::string ContentEditor::propertyName(QPDFObjectHandle ocg) {
-    auto known = ocgNames_.find(ocg.getObjGen());
-    if (known != ocgNames_.end()) return known->second;
+std::string ContentEditor::resourceName(const char* category, QPDFObjectHandle object, const char* prefix) {
+    auto key = std::make_pair(std::string(category), object.getObjGen());
+    auto known = names_.find(key);
+    if (known != names_.end()) return known->second;
     QPDFObjectHandle resources = ownResources();
-    QPDFObjectHandle properties = resources.getKey("/Properties");
-    if (!properties.isDictionary()) {
-        properties = QPDFObjectHandle::newDictionary();
-        resources.replaceKey("/Properties", properties);
-    } else if (properties.isIndirect()) {  // may be shared with other pages: add to a copy
-        properties = properties.shallowCopy();
-        resources.replaceKey("/Properties", properties);
+    QPDFObjectHandle dict = resources.getKey(category);
+    if (!dict.isDictionary()) {
+        dict = QPDFObjectHandle::newDictionary();
+        resources.replaceKey(category, dict);
+    } else if (dict.isIndirect()) {  // may be shared with other contents: add to a copy
+        dict = dict.shallowCopy();
+        resources.replaceKey(category, dict);
     }
     std::string name;
-    for (const std::string& key : properties.getKeys())
-        if (properties.getKey(key).isSameObjectAs(ocg)) name = key;
+    for (const auto& [itemKey, item] : dict.ditems())
+        if (item.isSameObjectAs(object)) {
+            name = itemKey;
+            break;
+        }
+    const std::string stem = std::string("/") + prefix;
     for (int n = 1; name.empty(); ++n)
-        if (!properties.hasKey("/oc" + std::to_string(n))) name = "/oc" + std::to_string(n);
-    properties.replaceKey(name, ocg);
-    ocgNames_[ocg.getObjGen()] = name;
+        if (!dict.hasKey(stem + std::to_string(n))) name = stem + std::to_string(n);
+    dict.replaceKey(name, object);
+    names_[key] = name;
     return name;
 }
 
@@ -150,7 +155,7 @@ bool ContentEditor::wrapInOptionalContent(const ContentElement& first, const Con
                                           QPDFObjectHandle ocg) {
     const auto* siblings = siblingsOf(content_.elements, &first, &last);
     if (!siblings || &first > &last || runHasBarrier(&first, &last)) return false;
-    const std::string name = propertyName(ocg);
+    const std::string name = resourceName("/Properties", ocg, "oc");
     insert(first.begin, "/OC " + name + " BDC\n", false);
     insert(last.end, "\nEMC\n", true);
     for (const ContentElement* e = &first; e <= &last; ++e) markImagesOptional(*e, ocg);

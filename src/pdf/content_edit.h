@@ -33,6 +33,13 @@ public:
 
     // Replaces the bytes [begin, end) of the content with text (e.g. a colour operator).
     void replace(size_t begin, size_t end, std::string text);
+    // Inserts text at a byte position, before any replacement starting there.
+    void insertText(size_t at, std::string text) { insert(at, std::move(text), false); }
+
+    // The name under which `object` is listed in the category ("/XObject", "/ColorSpace",
+    // "/Properties") of the content's own resources, adding it under prefix<n> when absent.
+    // Dictionaries shared with other contents only gain keys, so their users see no change.
+    std::string resourceName(const char* category, QPDFObjectHandle object, const char* prefix);
 
     bool edited() const { return !edits_.empty(); }
     // The content with every edit applied.
@@ -50,11 +57,10 @@ private:
     };
     void insert(size_t at, std::string text, bool closing);
     QPDFObjectHandle ownResources();
-    std::string propertyName(QPDFObjectHandle ocg);
 
     Content& content_;
     std::vector<Edit> edits_;
-    std::map<QPDFObjGen, std::string> ocgNames_;
+    std::map<std::pair<std::string, QPDFObjGen>, std::string> names_;
 };
 
 // Returns the colour space with every colorant for which `affected` is true renamed "None":

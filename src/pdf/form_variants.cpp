@@ -1,0 +1,36 @@
+// Form variants: the first claims the original, the others get copies.
+#include "pdf/form_variants.h"
+
+namespace vorlan::pdf {
+
+QPDFObjectHandle FormVariants::objectFor(QPDFObjectHandle form, const std::string& original, std::string bytes) {
+    auto [it, isNew] = entries_.try_emplace(form.getObjGen());
+    Entry& entry = it->second;
+    if (isNew) {
+        entry.form = form;
+        entry.changed = bytes != original;
+        entry.claimed = std::move(bytes);
+        return form;
+    }
+    if (bytes == entry.claimed) return form;
+    auto copy = entry.copies.find(bytes);
+    if (copy != entry.copies.end()) return copy->second;
+    QPDFObjectHandle made = pdf_.makeIndirectObject(
+        QPDFObjectHandle::newStream(&pdf_, bytes));
+    // The copy takes the form's dictionary (resources, matrix, box, group) but not its filters.
+    QPDFObjectHandle dict = made.getDict();
+    for (auto& [key, value] : form.getDict().ditems())
+        if (key != "/Length" && key != "/Filter" && key != "/DecodeParms") dict.replaceKey(key, value);
+    entry.copies.emplace(std::move(bytes), made);
+    return made;
+}
+
+void FormVariants::finish() {
+    for (auto& [objGen, entry] : entries_) {
+        if (!entry.changed) continue;
+        entry.form.replaceStreamData(entry.claimed, QPDFObjectHandle::newNull(), QPDFObjectHandle::newNull());
+    }
+    entries_.clear();
+}
+
+}  // namespace vorlan::pdf

@@ -1,0 +1,129 @@
+// Saving documents: name protection, atomic linearised save, output path preparation.
+#include "pdf/pdf_save.h"
+
+#include <qpdf/QPDFWriter.hh>
+
+#include <cstdio>
+#include <exception>
+#include <fstream>
+#include <set>
+#include <system_error>
+#include <unistd.h>
+#include <vector>
+
+namespace vorlan::pdf {
+namespace {
+
+std::string escapedName(const std::string& name) {
+    std::string out;
+    out.reserve(name.size() + 4);
+    for (char c : name) {
+        if (c == '#') out += "#23";
+        else out += c;
+    }
+    return out;
+}
+
+bool needsEscape(const std::string& name) { return name.find('#') != std::string::npos; }
+
+// Rewrites names inside one object's direct parts; indirect references are left to their own visit.
+void protectDirect(QPDFObjectHandle root) {
+    std::vector<QPDFObjectHandle> stack{root};
+    while (!stack.empty()) {
+        QPDFObjectHandle o = stack.back();
+        stack.pop_back();
+        if (o.isStream()) o = o.getDict();
+        if (o.isDictionary()) {
+            std::vector<std::string> renamedKeys;
+            std::vector<std::pair<std::string, QPDFObjectHandle>> renamedValues;
+            for (auto& [key, value] : o.ditems()) {
+                if (needsEscape(key)) renamedKeys.push_back(key);
+                if (value.isIndirect()) continue;
+                if (value.isName() && needsEscape(value.getName())) {
+                    renamedValues.emplace_back(key, QPDFObjectHandle::newName(escapedName(value.getName())));
+                } else if (value.isDictionary() || value.isArray()) {
+                    stack.push_back(value);
+                }
+            }
+            for (auto& [key, value] : renamedValues) o.replaceKey(key, value);
+            for (const std::string& key : renamedKeys) {
+                QPDFObjectHandle value = o.getKey(key);
+                o.removeKey(key);
+                o.replaceKey(escapedName(key), value);
+            }
+        } else if (o.isArray()) {
+            const int n = o.getArrayNItems();
+            for (int i = 0; i < n; ++i) {
+                QPDFObjectHandle item = o.getArrayItem(i);
+                if (item.isIndirect()) continue;
+                if (item.isName() && needsEscape(item.getName())) {
+                    o.setArrayItem(i, QPDFObjectHandle::newName(escapedName(item.getName())));
+                } else if (item.isDictionary() || item.isArray()) {
+                    stack.push_back(item);
+                }
+            }
+        }
+    }
+}
+
+}  // namespace
+
+void protectNumberSignsInNames(QPDF& pdf) {
+    // A name object held directly as an indirect object cannot be renamed in place; such names
+    // are practically unknown and stay as they are.
+    protectDirect(pdf.getTrailer());
+    for (QPDFObjectHandle o : pdf.getAllObjects()) protectDirect(o);
+}
+
+std::filesystem::path prepareOutputPath(const std::string& path) {
+    namespace fs = std::filesystem;
+    if (path.empty()) return {};
+    std::error_code ec;
+    fs::path absolute = fs::absolute(fs::path(path), ec);
+    if (ec) return {};
+    absolute = absolute.lexically_normal();
+    if (absolute.native().size() > kMaxOutputPath || !absolute.has_filename()) return {};
+    fs::path folder = absolute.parent_path();
+    fs::create_directories(folder, ec);
+    if (ec || !fs::is_directory(folder, ec)) return {};
+    if (fs::is_directory(absolute, ec)) return {};
+    if (fs::exists(absolute, ec)) {
+        // An existing file (perhaps the input itself) is never truncated here: it must be
+        // writable, and the save replaces it by renaming.
+        if (::access(absolute.c_str(), W_OK) != 0) return {};
+        return absolute;
+    }
+    {
+        std::ofstream probe(absolute, std::ios::binary | std::ios::trunc);
+        if (!probe) return {};
+    }
+    fs::remove(absolute, ec);
+    return absolute;
+}
+
+bool saveDocument(QPDF& pdf, const std::filesystem::path& path) {
+    namespace fs = std::filesystem;
+    if (path.empty()) return false;
+    fs::path temporary = path;
+    temporary += ".vorlan-" + std::to_string(::getpid()) + ".tmp";
+    try {
+        protectNumberSignsInNames(pdf);
+        QPDFWriter writer(pdf, temporary.c_str());
+        writer.setLinearization(true);
+        writer.setDeterministicID(true);
+        writer.write();
+    } catch (const std::exception&) {
+        std::error_code ec;
+        fs::remove(temporary, ec);
+        return false;
+    }
+    std::error_code ec;
+    fs::rename(temporary, path, ec);
+    if (ec) {
+        fs::remove(temporary, ec);
+        return false;
+    }
+    return true;
+}
+
+}  // namespace vorlan::pdf

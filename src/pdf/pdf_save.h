@@ -1,0 +1,31 @@
+// Saving documents and preparing the paths they are saved to.
+#pragma once
+
+#include <qpdf/QPDF.hh>
+
+#include <filesystem>
+#include <string>
+
+namespace vorlan::pdf {
+
+// Longest absolute output path accepted (the platform's path limit).
+inline constexpr size_t kMaxOutputPath = 4095;
+
+// Makes an output path absolute (relative to the current folder), creates the folders it needs
+// and proves that a file can be written there without touching a file that already exists.
+// Empty when the path is empty, too long, or its folder or file cannot be created.
+std::filesystem::path prepareOutputPath(const std::string& path);
+
+// Escapes '#' inside every name and dictionary key of the document (as "#23"). qpdf 11.3 writes
+// the '#' of decoded names as it stands, which readers take as the start of an escape, so the
+// names would come back corrupted. Call once, right before saving; the document's names read
+// differently in memory afterwards.
+void protectNumberSignsInNames(QPDF& pdf);
+
+// Full save with linearisation and a deterministic file ID, through a temporary file beside the
+// target that is renamed over it, so the target is either the complete new file or untouched
+// (saving over the open input is therefore safe). Names are protected first. False on any
+// failure. Never throws.
+bool saveDocument(QPDF& pdf, const std::filesystem::path& path);
+
+}  // namespace vorlan::pdf

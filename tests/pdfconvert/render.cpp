@@ -1,0 +1,109 @@
+// pdftoppm rendering and group switching for the conversion tests.
+#include "render.h"
+
+#include <qpdf/QPDF.hh>
+#include <qpdf/QPDFWriter.hh>
+
+#include <algorithm>
+#include <cmath>
+#include <cstdio>
+#include <sstream>
+
+#include "test_support.h"
+
+namespace vorlan::test {
+
+int GreyImage::at(double x, double y, int dpi) const {
+    const int px = static_cast<int>(std::floor(x * dpi / 72.0));
+    const int py = height - 1 - static_cast<int>(std::floor(y * dpi / 72.0));
+    if (px < 0 || py < 0 || px >= width || py >= height) return -1;
+    return pixels[static_cast<size_t>(py) * static_cast<size_t>(width) + static_cast<size_t>(px)];
+}
+
+long GreyImage::inked() const {
+    return static_cast<long>(std::count_if(pixels.begin(), pixels.end(), [](unsigned char p) { return p < 245; }));
+}
+
+GreyImage renderPage(const std::string& pdf, int page, int dpi) {
+    GreyImage image;
+    if (!haveProgram("pdftoppm")) return image;
+    TempDir dir;
+    const std::string stem = (dir.path() / "r").string();
+    const std::string cmd = "pdftoppm -gray -r " + std::to_string(dpi) + " -f " + std::to_string(page) + " -l " +
+                            std::to_string(page) + " -singlefile '" + pdf + "' '" + stem + "' >/dev/null 2>&1";
+    if (runCommand(cmd) != 0) return image;
+    const std::string data = readFile(stem + ".pgm");
+    std::istringstream in(data);
+    std::string magic;
+    int maxValue = 0;
+    in >> magic >> image.width >> image.height >> maxValue;
+    in.get();
+    if (magic != "P5" || image.width <= 0 || image.height <= 0) return GreyImage();
+    const size_t size = static_cast<size_t>(image.width) * static_cast<size_t>(image.height);
+    const size_t offset = static_cast<size_t>(in.tellg());
+    if (data.size() < offset + size) return GreyImage();
+    image.pixels.assign(data.begin() + static_cast<long>(offset), data.begin() + static_cast<long>(offset + size));
+    return image;
+}
+
+bool showOnlyGroups(const std::string& in, const std::string& out, const std::vector<std::string>& names) {
+    try {
+        QPDF pdf;
+        pdf.processFile(in.c_str());
+        QPDFObjectHandle properties = pdf.getRoot().getKey("/OCProperties");
+        if (!properties.isDictionary()) return false;
+        QPDFObjectHandle on = QPDFObjectHandle::newArray(), off = QPDFObjectHandle::newArray();
+        for (QPDFObjectHandle ocg : properties.getKey("/OCGs").aitems()) {
+            const std::string name = ocg.getKey("/Name").getUTF8Value();
+            (std::find(names.begin(), names.end(), name) != names.end() ? on : off).appendItem(ocg);
+        }
+        QPDFObjectHandle config = properties.getKey("/D");
+        config.replaceKey("/ON", on);
+        config.replaceKey("/OFF", off);
+        config.removeKey("/BaseState");
+        QPDFWriter writer(pdf, out.c_str());
+        writer.write();
+        return true;
+    } catch (const std::exception&) {
+        return false;
+    }
+}
+
+std::vector<std::string> groupOrder(const std::string& path) {
+    std::vector<std::string> names;
+    try {
+        QPDF pdf;
+        pdf.processFile(path.c_str());
+        QPDFObjectHandle order = pdf.getRoot().getKey("/OCProperties").getKey("/D").getKey("/Order");
+        if (order.isArray())
+            for (QPDFObjectHandle item : order.aitems())
+                if (item.isDictionary()) names.push_back(item.getKey("/Name").getUTF8Value());
+    } catch (const std::exception&) {
+    }
+    return names;
+}
+
+std::string handWrittenPdf(const std::vector<std::string>& objects) {
+    std::string pdf = "%PDF-1.7\n";
+    std::vector<size_t> offsets;
+    for (size_t i = 0; i < objects.size(); ++i) {
+        offsets.push_back(pdf.size());
+        pdf += std::to_string(i + 1) + " 0 obj\n" + objects[i] + "\nendobj\n";
+    }
+    const size_t xref = pdf.size();
+    pdf += "xref\n0 " + std::to_string(objects.size() + 1) + "\n0000000000 65535 f \n";
+    for (size_t offset : offsets) {
+        char line[24];
+        std::snprintf(line, sizeof line, "%010zu 00000 n \n", offset);
+        pdf += line;
+    }
+    pdf += "trailer\n<< /Size " + std::to_string(objects.size() + 1) + " /Root 1 0 R >>\nstartxref\n" +
+           std::to_string(xref) + "\n%%EOF\n";
+    return pdf;
+}
+
+bool qpdfCheckPasses(const std::string& pdf, std::string* output) {
+    return runCommand("qpdf --check '" + pdf + "' 2>&1", output) == 0;
+}
+
+}  // namespace vorlan::test

@@ -1,0 +1,35 @@
+// Rendering helpers for judging converted and rewritten PDFs: pdftoppm grey images with chosen
+// optional-content groups switched on.
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace vorlan::test {
+
+struct GreyImage {
+    int width = 0, height = 0;
+    std::vector<unsigned char> pixels;
+    // Grey value at a point given in PDF units from the page's lower left corner.
+    int at(double x, double y, int dpi) const;
+    long inked() const;  // pixels darker than near-white
+};
+
+// Renders one page (1-based) with pdftoppm; empty image when pdftoppm is missing or fails.
+GreyImage renderPage(const std::string& pdf, int page, int dpi = 36);
+
+// Writes a copy of `in` whose default configuration shows exactly the named groups (/ON) and
+// hides every other group of the document (/OFF). False on failure.
+bool showOnlyGroups(const std::string& in, const std::string& out, const std::vector<std::string>& names);
+
+// The names of the groups listed at the top level of the default configuration's /Order.
+std::vector<std::string> groupOrder(const std::string& pdf);
+
+// A PDF from the bodies of objects 1, 2, ... (object 1 the catalog), with a correct
+// cross-reference table: for input that qpdf's writer would change.
+std::string handWrittenPdf(const std::vector<std::string>& objects);
+
+// `qpdf --check` exit status 0 (warnings count as failure).
+bool qpdfCheckPasses(const std::string& pdf, std::string* output = nullptr);
+
+}  // namespace vorlan::test
