@@ -9,6 +9,7 @@
 #include <string>
 
 #include <fcntl.h>
+#include <sys/types.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -41,6 +42,8 @@ unsigned formatFor(const pugi::xml_document& doc) {
     return pugi::format_indent;
 }
 
+// Writes to a file descriptor, starting write-back of every full chunk while the rest is still
+// being serialised, so that the closing fsync has little left to wait for.
 class FdWriter : public pugi::xml_writer {
 public:
     explicit FdWriter(int fd) : fd_(fd) {}
@@ -55,13 +58,22 @@ public:
             }
             p += n;
             size -= static_cast<size_t>(n);
+            written_ += static_cast<off_t>(n);
         }
+#ifdef SYNC_FILE_RANGE_WRITE
+        if (ok_ && written_ - flushed_ >= kChunk) {
+            ::sync_file_range(fd_, flushed_, written_ - flushed_, SYNC_FILE_RANGE_WRITE);
+            flushed_ = written_;
+        }
+#endif
     }
     bool ok() const { return ok_; }
 
 private:
+    static constexpr off_t kChunk = 4 << 20;
     int fd_;
     bool ok_ = true;
+    off_t written_ = 0, flushed_ = 0;
 };
 
 // Current time, or SOURCE_DATE_EPOCH when set, as an xs:dateTime in UTC.
