@@ -12,6 +12,17 @@
 //   JDFXYPair, JDFRectangle, JDFMatrix (geometry.h); JDFException (exception.h)
 // Typical reading: JDFParser p; if (p.Parse(path)) { JDFNode root = JDFDoc(p.GetDocument()).GetJDFRoot(); … }
 // Handles convert implicitly from KElement (JDFRunList rl = someElement;) without a type check.
+// Behaviour worth knowing:
+//  - Parse never throws; a missing or malformed file returns false.
+//  - Partition attributes (and a run list's LayoutElement) are inherited from enclosing
+//    partitions when read through JDFResource and its subclasses, not through KElement.
+//  - GetChildElementVector follows ref elements (MediaRef → Media) by default;
+//    GetChildrenByTagName returns them as written.
+//  - Setters of enumerations throw JDFException for 0 or out-of-range numbers;
+//    AppendMatchingResource throws when the node's process types have no free slot left.
+//  - New IDs are deterministic (prefix + six-digit counter), so the same construction writes the
+//    same bytes; Write2File replaces its target atomically and returns false on any failure.
+//  - Not thread-safe: one document is used from one thread at a time.
 // Enumeration numbers and their tokens: enum_tables.h. Schema-declared attribute and element
 // lists per element kind (for descriptive listings): element_info.h.
 #pragma once
