@@ -16,5 +16,7 @@ write_basic_package_version_file(${CMAKE_CURRENT_BINARY_DIR}/vorlanConfigVersion
 install(FILES ${CMAKE_CURRENT_BINARY_DIR}/vorlanConfig.cmake ${CMAKE_CURRENT_BINARY_DIR}/vorlanConfigVersion.cmake
   DESTINATION ${CMAKE_INSTALL_LIBDIR}/cmake/vorlan)
 
+# The pkg-config file finds the prefix relative to itself, so the installed tree can move.
+file(RELATIVE_PATH VORLAN_PC_TO_PREFIX "/prefix/${CMAKE_INSTALL_LIBDIR}/pkgconfig" "/prefix")
 configure_file(cmake/vorlan.pc.in ${CMAKE_CURRENT_BINARY_DIR}/vorlan.pc @ONLY)
 install(FILES ${CMAKE_CURRENT_BINARY_DIR}/vorlan.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
