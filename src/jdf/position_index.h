@@ -2,9 +2,10 @@
 //
 // The model's lists are plain public vectors, searched by a key field ("the first row with that
 // ordinal"). The index answers that question without a linear search and keeps its meaning:
-// it is rebuilt whenever the list's size differs from the size it was built for, or when a
-// remembered position no longer holds its key. Code that changes keys in place must call
-// invalidate() (the table operations do).
+// it is rebuilt whenever the list shrank (or is another list of the same size), or when a
+// remembered position no longer holds its key; elements appended since it was built are
+// indexed on their own, so lists that grow one element at a time stay linear. Code that changes
+// keys in place must call invalidate() (the table operations do).
 #pragma once
 
 #include <cstddef>
@@ -25,7 +26,10 @@ public:
 
     // Position of the first element whose key equals key, or npos.
     size_t find(const std::vector<E>& list, int32_t key) {
-        if (list.size() != builtSize_ || list.data() != builtData_) rebuild(list);
+        if (builtSize_ == npos || list.size() < builtSize_ || (list.size() == builtSize_ && list.data() != builtData_))
+            rebuild(list);
+        else if (list.size() > builtSize_)
+            extend(list);
         for (int attempt = 0; attempt < 2; ++attempt) {
             auto it = first_.find(key);
             if (it == first_.end()) return npos;
@@ -44,7 +48,12 @@ private:
         first_.clear();
         repeated_.clear();
         first_.reserve(list.size());
-        for (size_t i = 0; i < list.size(); ++i) {
+        builtSize_ = 0;
+        extend(list);
+    }
+    // Indexes the elements from the built size on; earlier positions keep their first place.
+    void extend(const std::vector<E>& list) {
+        for (size_t i = builtSize_; i < list.size(); ++i) {
             int64_t key = KeyOf()(list[i]);
             if (key == kNoKey) continue;
             if (!first_.emplace(static_cast<int32_t>(key), i).second) repeated_.insert(static_cast<int32_t>(key));
