@@ -93,3 +93,66 @@ TEST_F(Pipeline, EarlyExitLeavesNothingToLeak) {
                       "<Surface index='0' dieSepInternalNames='Die'/></DieCut></OptionalContentGroupData>"),
               LD_FILE_NOT_FOUND);
 }
+
+namespace {
+
+// A one-sheet ticket whose run list names pdfUrl.
+std::string ticketNaming(const std::string& pdfUrl) {
+    return R"(<?xml version="1.0" encoding="UTF-8"?>
+<JDF xmlns="http://www.CIP4.org/JDFSchema_1_1" ID="n1" JobPartID="n1" Type="Imposition" Status="Waiting" Version="1.3">
+  <ResourcePool>
+    <RunList ID="r1" Class="Parameter" Status="Available" PartIDKeys="Run">
+      <RunList Run="1" NPage="2">
+        <LayoutElement><FileSpec URL=")" + pdfUrl + R"(" MimeType="application/pdf"/></LayoutElement>
+      </RunList>
+    </RunList>
+    <Layout ID="r2" Class="Parameter" Status="Available">
+      <Signature Name="S"><Sheet Name="1">
+        <Surface Side="Front"><ContentObject CTM="1 0 0 1 0 0" Ord="0"/></Surface>
+        <Surface Side="Back"><ContentObject CTM="1 0 0 1 0 0" Ord="1"/></Surface>
+      </Sheet></Signature>
+    </Layout>
+  </ResourcePool>
+  <ResourceLinkPool>
+    <RunListLink rRef="r1" Usage="Input" ProcessUsage="Document"/>
+    <LayoutLink rRef="r2" Usage="Input"/>
+  </ResourceLinkPool>
+</JDF>
+)";
+}
+
+}  // namespace
+
+TEST_F(Pipeline, TicketNamingAMissingPdfGivesFileNotFound) {
+    writeFile(jobs / "job5D0001" / "ticket.jdf", ticketNaming("art.pdf"));
+    EXPECT_EQ(consume(jobs / "job5.0001", "<OptionalContentGroupData DefaultLayerMode='true'/>"), LD_FILE_NOT_FOUND);
+    // The surfaces were counted before the PDFs were looked for.
+    EXPECT_EQ(vorlan::test::readFile(jobs / "job5.dieinfo"), "OrigPageCount=2\r\n");
+}
+
+TEST_F(Pipeline, PercentTwentyUrlFindsTheFileInASubFolder) {
+    writeFile(jobs / "job5D0001" / "ticket.jdf", ticketNaming("file:///elsewhere/Page%201.pdf"));
+    writeFile(jobs / "job5D0001" / "pdfs" / "Page 1.pdf", vorlan::test::minimalPdf());
+    JDFinterface job(nullptr, nullptr, nullptr);
+    char output[] = "/nonexistent-folder/out.jdf";
+    std::string data = (jobs / "job5.0001").string();
+    // No description and no ticket-less path: the job leaves after the PDFs were found.
+    job.JDF_InitializeAndCreateNewJDF(output, nullptr, 0, data.c_str(), jobs.path().c_str(), "All", 5);
+    EXPECT_NE(job.JDF_GetLastErrorCode(), LD_FILE_NOT_FOUND);
+}
+
+TEST_F(Pipeline, OnlyTheExactValueTrueSetsTheDieFlags) {
+    JobAttributeStore store(jobs / "store");
+    ASSERT_TRUE(store.open());
+    ASSERT_TRUE(store.set(5, "KVPrintDieLine", "true"));
+    ASSERT_TRUE(store.set(5, "KVAutoDieControl", "True"));
+    fs::create_directories(jobs / "job5D0001");
+    JDFinterface job(nullptr, nullptr, nullptr);
+    char output[] = "/nonexistent-folder/out.jdf";
+    std::string data = (jobs / "job5.0001").string();
+    EXPECT_EQ(job.JDF_InitializeAndCreateNewJDF(output, nullptr, 0, data.c_str(), jobs.path().c_str(), "all", 5),
+              LD_FILE_NOT_FOUND);
+    EXPECT_FALSE(job.worker()->printDieLine);
+    EXPECT_TRUE(job.worker()->autoDieControl);
+    EXPECT_EQ(job.worker()->pageRangeMode, 3);  // page-range texts are exact: "all" is a page list
+}
