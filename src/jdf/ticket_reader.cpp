@@ -2,8 +2,11 @@
 // their PDFs, the layout and the rendering parameters; then numbers the logical pages.
 #include <cstdio>
 #include <cstdlib>
+#include <cstring>
 #include <memory>
+#include <string>
 
+#include "jdf/element_walk.h"
 #include "jdf/ticket_handles.h"
 #include "jdf/ticket_reading.h"
 #include "platform/os/text.h"
@@ -14,6 +17,62 @@ namespace {
 // The first element of that name anywhere below `from` (flags as the reader passes them).
 JDF::KElement firstBelow(const JDF::KElement& from, const wchar_t* name, const wchar_t* nameSpace = L"") {
     return from.GetChildByTagName(name, nameSpace, 0, JDF::JDFAttributeMap(), false, true);
+}
+
+// The first InterpretingParams, RenderingParams and DigitalPrintingParams below the root, each
+// as firstBelow finds it, in one walk: absent ones would otherwise cost a walk of the whole
+// document each.
+void findParameterResources(LD_JDFHandles& t) {
+    static const char* const names[] = {"InterpretingParams", "RenderingParams", "DigitalPrintingParams"};
+    JDF::KElement* const slots[] = {&t.interpretingParamsElement, &t.renderingParamsElement,
+                                    &t.digitalPrintingParamsElement};
+    for (JDF::KElement* slot : slots) *slot = JDF::KElement();
+    int missing = 3;
+    vorlan::jdf::forEachElementBelow(t.rootNode.node(), [&](pugi::xml_node n) {
+        const char* local = vorlan::jdf::localName(n);
+        for (int k = 0; k < 3; ++k) {
+            if (slots[k]->isNull() && std::strcmp(local, names[k]) == 0) {
+                *slots[k] = JDF::KElement(n, t.rootNode.document());
+                --missing;
+            }
+        }
+        return missing > 0;
+    });
+}
+
+// Whether a ProcessUsage value equals usage (ASCII) ignoring case, as the wide comparison
+// has it; text beyond ASCII is compared in wide form.
+bool sameUsage(const char* value, const char* usage) {
+    if (vorlan::os::equalsIgnoreCaseAscii(value, usage)) return true;
+    for (const char* c = value; *c; ++c)
+        if (static_cast<unsigned char>(*c) >= 0x80)
+            return vorlan::os::equalsIgnoreCase(JDF::WString(value).c_str(), JDF::WString(usage).c_str());
+    return false;
+}
+
+// Whether a link to the resource has that ProcessUsage: an element of a ResourceLinkPool, or a
+// <resource name>Ref element, whose rRef is the resource root's ID (the links GetLinks finds),
+// looked for in one walk of the document.
+bool hasLinkWithUsage(const JDF::JDFResource& resource, const char* usage) {
+    if (resource.isNull()) return false;
+    JDF::JDFResource root = resource.GetResourceRoot();
+    pugi::xml_attribute idAttribute = root.node().attribute("ID");
+    const char* id = idAttribute.value();
+    if (!*id) return false;
+    std::string refName = std::string(resource.node().name()) + "Ref";
+    bool prefixedRef = refName.find(':') != std::string::npos;
+    pugi::xml_node top = resource.GetDocRoot().node();
+    bool found = false;
+    vorlan::jdf::forEachElementBelow(top, [&](pugi::xml_node n) {
+        pugi::xml_node parent = n.parent();
+        bool inPool = parent != top && std::strcmp(vorlan::jdf::localName(parent), "ResourceLinkPool") == 0;
+        bool isRef = refName == (prefixedRef ? n.name() : vorlan::jdf::localName(n));
+        if ((inPool || isRef) && std::strcmp(n.attribute("rRef").value(), id) == 0 &&
+            sameUsage(n.attribute("ProcessUsage").value(), usage))
+            found = true;
+        return !found;
+    });
+    return found;
 }
 
 bool isImposition(const JDF::JDFNode& node) {
@@ -54,17 +113,10 @@ int LD_JDF::FindImpositionNode(JDF::JDFNode& root, JDF::JDFNode& out) {
     return 1;
 }
 
-bool LD_JDF::isProcessUsageMarks(const JDF::JDFResource& resource) {
-    for (const JDF::KElement& link : resource.GetLinks(L"*"))
-        if (vorlan::os::equalsIgnoreCase(JDF::JDFResourceLink(link).GetProcessUsage().c_str(), L"Marks")) return true;
-    return false;
-}
+bool LD_JDF::isProcessUsageMarks(const JDF::JDFResource& resource) { return hasLinkWithUsage(resource, "Marks"); }
 
 bool LD_JDF::isProcessUsageDocument(const JDF::JDFResource& resource) {
-    for (const JDF::KElement& link : resource.GetLinks(L"*"))
-        if (vorlan::os::equalsIgnoreCase(JDF::JDFResourceLink(link).GetProcessUsage().c_str(), L"Document"))
-            return true;
-    return false;
+    return hasLinkWithUsage(resource, "Document");
 }
 
 LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
@@ -144,9 +196,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
             }
         }
 
-        t.interpretingParamsElement = firstBelow(t.rootNode, L"InterpretingParams");
-        t.renderingParamsElement = firstBelow(t.rootNode, L"RenderingParams");
-        t.digitalPrintingParamsElement = firstBelow(t.rootNode, L"DigitalPrintingParams");
+        findParameterResources(t);
         for (const JDF::KElement* e : {&t.interpretingParamsElement, &t.renderingParamsElement,
                                        &t.digitalPrintingParamsElement})
             if (e->isNull()) lastError = LD_JDF_RESOURCE_MISSING;
