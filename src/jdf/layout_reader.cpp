@@ -3,11 +3,12 @@
 // Both ways of writing a layout are accepted: nested Signature / Sheet / Surface elements, and a
 // Layout partitioned by SignatureName, SheetName and Side, whose partitions are nested Layouts.
 // The counters of the worker are not reset, so a second Layout continues the numbering.
+#include <algorithm>
 #include <cstdlib>
 #include <cstring>
-#include <map>
 #include <memory>
-#include <string_view>
+#include <utility>
+#include <vector>
 
 #include <pugixml.hpp>
 
@@ -37,14 +38,20 @@ bool named(const JDF::KElement& e, const wchar_t* name) {
 
 // Exact-size wide copy of UTF-8 text.
 wchar_t* copyText(const char* text) {
-    size_t length = std::strlen(text);
+    size_t length = 0;
     bool ascii = true;
-    for (size_t i = 0; i < length && ascii; ++i) ascii = static_cast<unsigned char>(text[i]) < 0x80;
+    for (; text[length]; ++length) ascii = ascii && static_cast<unsigned char>(text[length]) < 0x80;
     if (!ascii) return copyText(JDF::WString(text));
     auto* copy = static_cast<wchar_t*>(std::malloc((length + 1) * sizeof(wchar_t)));
     if (!copy) throw OutOfText{};
     for (size_t i = 0; i <= length; ++i) copy[i] = static_cast<wchar_t>(static_cast<unsigned char>(text[i]));
     return copy;
+}
+
+bool isAscii(const char* text) {
+    for (; *text; ++text)
+        if (static_cast<unsigned char>(*text) >= 0x80) return false;
+    return true;
 }
 
 bool namedNode(pugi::xml_node n, const char* name) {
@@ -53,13 +60,64 @@ bool namedNode(pugi::xml_node n, const char* name) {
     return vorlan::os::equalsIgnoreCaseAscii(colon ? colon + 1 : qualified, name);
 }
 
-// An attribute's value; empty when absent.
-const char* attribute(pugi::xml_node n, const char* key) { return n.attribute(key).value(); }
-
-bool isTrue(pugi::xml_node n, const char* key) {
-    pugi::xml_attribute a = n.attribute(key);
-    return a && vorlan::os::equalsIgnoreCaseAscii(a.value(), "true");
+// An attribute as JDFResource::GetAttribute finds it: on the element, else on the enclosing
+// elements of the same name (the partitions it belongs to); null when absent.
+const char* inheritedAttribute(pugi::xml_node element, const char* key) {
+    for (pugi::xml_node e = element; e; e = e.parent()) {
+        if (pugi::xml_attribute a = e.attribute(key)) return a.value();
+        if (std::strcmp(e.parent().name(), element.name()) != 0) break;
+    }
+    return nullptr;
 }
+
+bool isTrue(const char* value) { return value && vorlan::os::equalsIgnoreCaseAscii(value, "true"); }
+
+// The attributes of a placed object the reader uses, found in one pass over its attributes;
+// each is the first of its name (as xml_node::attribute finds it), null when absent.
+struct PlacedAttributes {
+    const char* ctm = nullptr;
+    const char* clipBox = nullptr;
+    const char* clipPath = nullptr;
+    const char* sourceClipPath = nullptr;
+    const char* ord = nullptr;
+    const char* trimCtm = nullptr;
+    const char* trimSize = nullptr;
+    const char* cachePlacedObject = nullptr;
+    const char* ignoreClipForReuse = nullptr;
+
+    explicit PlacedAttributes(pugi::xml_node element) {
+        for (pugi::xml_attribute a = element.first_attribute(); a; a = a.next_attribute()) {
+            const char* name = a.name();
+            const char** slot = slotOf(name);
+            if (slot && !*slot) *slot = a.value();
+        }
+    }
+
+    // The value, or "" when absent.
+    static const char* text(const char* value) { return value ? value : ""; }
+
+private:
+    const char** slotOf(const char* name) {
+        switch (name[0]) {
+            case 'C':
+                if (std::strcmp(name, "CTM") == 0) return &ctm;
+                if (std::strcmp(name, "ClipBox") == 0) return &clipBox;
+                if (std::strcmp(name, "ClipPath") == 0) return &clipPath;
+                return nullptr;
+            case 'O': return std::strcmp(name, "Ord") == 0 ? &ord : nullptr;
+            case 'S': return std::strcmp(name, "SourceClipPath") == 0 ? &sourceClipPath : nullptr;
+            case 'T':
+                if (std::strcmp(name, "TrimSize") == 0) return &trimSize;
+                if (std::strcmp(name, "TrimCTM") == 0) return &trimCtm;
+                return nullptr;
+            case 'A':
+                if (std::strcmp(name, "ADBE:CachePlacedObject") == 0) return &cachePlacedObject;
+                if (std::strcmp(name, "ADBE:IgnoreClipForReuse") == 0) return &ignoreClipForReuse;
+                return nullptr;
+            default: return nullptr;
+        }
+    }
+};
 
 // An Ord value read like _wtoi.
 int32_t readOrd(const char* text) {
@@ -87,13 +145,9 @@ LD_Box* readBox(const char* text) {
 
 // The first point of the text, carrying the text; (-1, -1) without text when there is none.
 LD_Point* readTrimSize(const char* text) {
-    std::vector<LD_Point*> points;
-    vorlan::geometry::parsePoints(text, points);
-    if (points.empty()) return new LD_Point;
-    for (size_t i = 1; i < points.size(); ++i) delete points[i];
-    std::unique_ptr<LD_Point> first(points[0]);
-    first->text = copyText(text);
-    return first.release();
+    auto point = std::make_unique<LD_Point>();
+    if (vorlan::geometry::parseFirstPoint(text, *point)) point->text = copyText(text);
+    return point.release();
 }
 
 class LayoutReader {
@@ -165,37 +219,44 @@ private:
         surface->sheetIndex = sheet.index;
         surface->contentType = CONTENT_CONTENT;
         // Surface attributes may sit on an enclosing partition (SurfaceContentsBox on the sheet).
-        JDF::JDFResource resource(element);
-        surface->isFront = resource.GetAttribute(L"Side") == L"Front";
+        pugi::xml_node node = element.node();
+        const char* side = inheritedAttribute(node, "Side");
+        surface->isFront = side && std::strcmp(side, "Front") == 0;
         place(surface->isFront ? sheet.front : sheet.back, surface);
         w_.surfaces.push_back(surface);
 
         if (!surface->SurfaceContentsBox) surface->SurfaceContentsBox = new LD_Box;  // made with the surface
-        LD_JDF::parseStringAsBox(resource.GetAttribute(L"SurfaceContentsBox"), surface->SurfaceContentsBox);
-        if (resource.HasAttribute(L"ADBE:StepAndRepeat") &&
-            vorlan::os::equalsIgnoreCase(resource.GetAttribute(L"ADBE:StepAndRepeat").c_str(), L"true"))
-            surface->StepAndRepeat = true;
+        const char* contentsBox = inheritedAttribute(node, "SurfaceContentsBox");
+        if (!contentsBox) contentsBox = "";
+        if (isAscii(contentsBox)) vorlan::geometry::parseBox(contentsBox, surface->SurfaceContentsBox);
+        else LD_JDF::parseStringAsBox(JDF::WString(contentsBox), surface->SurfaceContentsBox);
+        if (isTrue(inheritedAttribute(node, "ADBE:StepAndRepeat"))) surface->StepAndRepeat = true;
 
+        size_t children = 0;
+        for (pugi::xml_node child = node.first_child(); child; child = child.next_sibling())
+            children += child.type() == pugi::node_element;
+        surface->contentObjects.reserve(children);
         ords_.clear();
-        repeated_ = false;
-        for (pugi::xml_node child = element.node().first_child(); child; child = child.next_sibling()) {
+        for (pugi::xml_node child = node.first_child(); child; child = child.next_sibling()) {
             if (child.type() != pugi::node_element) continue;
             surface->isEmpty = false;
             if (namedNode(child, "ContentObject")) readContentObject(child, *surface);
             else if (namedNode(child, "MarkObject")) readMarkObject(child, *surface);
             ++w_.placedObjectCount;
         }
-        if (repeated_) markFirstOccurrences(*surface);
+        markRepeatedOrds(*surface);
     }
 
-    // Objects after the first with the same Ord were marked as they were read; this marks the
-    // first one of each repeated Ord too.
-    void markFirstOccurrences(LD_Surface& surface) {
-        for (LD_ContentObject* object : surface.contentObjects) {
-            auto it = ords_.find(object->Ord);
-            if (it == ords_.end()) continue;
-            if (it->second) object->ordRepeated = true;
-            ords_.erase(it);
+    // Marks every content object of the surface whose Ord another one of the surface shares.
+    void markRepeatedOrds(LD_Surface& surface) {
+        if (ords_.size() < 2) return;
+        std::sort(ords_.begin(), ords_.end());
+        for (size_t i = 0; i < ords_.size();) {
+            size_t end = i + 1;
+            while (end < ords_.size() && ords_[end].first == ords_[i].first) ++end;
+            if (end - i > 1)
+                for (size_t k = i; k < end; ++k) surface.contentObjects[ords_[k].second]->ordRepeated = true;
+            i = end;
         }
     }
 
@@ -207,33 +268,26 @@ private:
         object->contentObjectIndex = w_.contentObjectCount;
         object->surfaceIndex = surface.index;
 
-        const char* ctm = attribute(element, "CTM");
+        PlacedAttributes a(element);
+        const char* ctm = PlacedAttributes::text(a.ctm);
         object->CTM->text = copyText(ctm);
         vorlan::geometry::parseCTM(ctm, object->CTM);
-        const char* clipBox = attribute(element, "ClipBox");
-        if (*clipBox) object->ClipBox = readBox(clipBox);
-        const char* clipPath = attribute(element, "ClipPath");
-        if (!*clipPath) clipPath = attribute(element, "SourceClipPath");
+        if (a.clipBox && *a.clipBox) object->ClipBox = readBox(a.clipBox);
+        const char* clipPath = PlacedAttributes::text(a.clipPath);
+        if (!*clipPath) clipPath = PlacedAttributes::text(a.sourceClipPath);
         if (*clipPath) {
             object->clipPathText = copyText(clipPath);
             object->ClipPath = new std::vector<LD_ClipPathOperations*>;
             vorlan::geometry::parseClipPath(clipPath, *object->ClipPath);
         }
 
-        object->Ord = readOrd(attribute(element, "Ord"));
-        auto [it, added] = ords_.emplace(object->Ord, false);
-        if (!added) {
-            it->second = true;
-            object->ordRepeated = true;
-            repeated_ = true;
-        }
+        object->Ord = readOrd(PlacedAttributes::text(a.ord));
+        ords_.emplace_back(object->Ord, surface.contentObjects.size() - 1);
 
-        const char* trimCtm = attribute(element, "TrimCTM");
-        if (*trimCtm) object->TrimCTM = readMatrix(trimCtm);
-        const char* trimSize = attribute(element, "TrimSize");
-        if (*trimSize) object->TrimSize = readTrimSize(trimSize);
-        object->CachePlacedObject = isTrue(element, "ADBE:CachePlacedObject");
-        object->IgnoreClipForReuse = isTrue(element, "ADBE:IgnoreClipForReuse");
+        if (a.trimCtm && *a.trimCtm) object->TrimCTM = readMatrix(a.trimCtm);
+        if (a.trimSize && *a.trimSize) object->TrimSize = readTrimSize(a.trimSize);
+        object->CachePlacedObject = isTrue(a.cachePlacedObject);
+        object->IgnoreClipForReuse = isTrue(a.ignoreClipForReuse);
 
         w_.contentObjectOrdinalMap.push_back({object->Ord, object->contentObjectIndex});
         ++w_.contentObjectCount;
@@ -247,22 +301,19 @@ private:
         object->markObjectIndex = w_.markObjectCount;
         object->surfaceIndex = surface.index;
 
-        const char* ctm = attribute(element, "CTM");
+        PlacedAttributes a(element);
+        const char* ctm = PlacedAttributes::text(a.ctm);
         object->CTM->text = copyText(ctm);
         vorlan::geometry::parseCTM(ctm, object->CTM);
-        const char* clipBox = attribute(element, "ClipBox");
-        if (*clipBox) object->ClipBox = readBox(clipBox);
-        object->Ord = readOrd(attribute(element, "Ord"));
-        const char* trimCtm = attribute(element, "TrimCTM");
-        if (*trimCtm) object->TrimCTM = readMatrix(trimCtm);
-        const char* trimSize = attribute(element, "TrimSize");
-        if (*trimSize) object->TrimSize = readTrimSize(trimSize);
+        if (a.clipBox && *a.clipBox) object->ClipBox = readBox(a.clipBox);
+        object->Ord = readOrd(PlacedAttributes::text(a.ord));
+        if (a.trimCtm && *a.trimCtm) object->TrimCTM = readMatrix(a.trimCtm);
+        if (a.trimSize && *a.trimSize) object->TrimSize = readTrimSize(a.trimSize);
         ++w_.markObjectCount;
     }
 
     LD_JDF& w_;
-    std::map<int32_t, bool> ords_;  // Ord values of the current surface → met more than once
-    bool repeated_ = false;
+    std::vector<std::pair<int32_t, size_t>> ords_;  // (Ord, position) of the current surface's content objects
 };
 
 }  // namespace

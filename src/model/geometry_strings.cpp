@@ -1,7 +1,9 @@
 // Geometry attribute text (boxes, matrices, points, clip paths) read into the geometry records.
 #include "model/geometry_strings.h"
 
+#include <cctype>
 #include <charconv>
+#include <cstdint>
 #include <cstring>
 #include <string>
 #include <string_view>
@@ -12,16 +14,40 @@
 
 namespace {
 
+bool isDigit(char c) { return c >= '0' && c <= '9'; }
+
+// Plain decimals ("841.89", "30") with few digits, the usual geometry text, read exactly without
+// the general parser: an integer mantissa below 2^53 divided by a power of ten up to 10^22 is
+// one correctly rounded operation, the value the general parser gives. False for anything else
+// (exponents, long numbers, no digits), which is left to the general parser.
+bool readPlainDecimal(const char* p, const char* end, double& value) {
+    static constexpr double kPowers[] = {1e0,  1e1,  1e2,  1e3,  1e4,  1e5,  1e6,  1e7,  1e8,  1e9,  1e10, 1e11,
+                                         1e12, 1e13, 1e14, 1e15, 1e16, 1e17, 1e18, 1e19, 1e20, 1e21, 1e22};
+    uint64_t mantissa = 0;
+    int digits = 0, fraction = 0;
+    for (; p < end && isDigit(*p); ++p, ++digits) mantissa = mantissa * 10 + static_cast<uint64_t>(*p - '0');
+    if (p < end && *p == '.') {
+        for (++p; p < end && isDigit(*p); ++p, ++digits, ++fraction)
+            mantissa = mantissa * 10 + static_cast<uint64_t>(*p - '0');
+    }
+    if (digits == 0 || digits > 15 || fraction > 22) return false;
+    if (p < end && (*p == 'e' || *p == 'E')) return false;
+    value = static_cast<double>(mantissa) / kPowers[fraction];
+    return true;
+}
+
 // Reads a number the way atof does (leading blanks, optional sign, as many characters as form a
 // number, 0 when none), but always with '.' as the decimal point whatever the locale.
 double readNumber(std::string_view token) {
     size_t i = 0;
-    while (i < token.size() && std::isspace(static_cast<unsigned char>(token[i]))) ++i;
+    auto plain = [](char c) { return isDigit(c) || c == '+' || c == '-' || c == '.'; };
+    while (i < token.size() && !plain(token[i]) && std::isspace(static_cast<unsigned char>(token[i]))) ++i;
     bool negative = false;
     if (i < token.size() && (token[i] == '+' || token[i] == '-')) negative = token[i++] == '-';
     double value = 0;
     // A second sign ("+-1") is not a number for atof either.
-    if (i < token.size() && token[i] != '+' && token[i] != '-')
+    if (i < token.size() && token[i] != '+' && token[i] != '-' &&
+        !readPlainDecimal(token.data() + i, token.data() + token.size(), value))
         std::from_chars(token.data() + i, token.data() + token.size(), value);
     return negative ? -value : value;
 }
@@ -122,6 +148,23 @@ void parsePoints(std::string_view text, std::vector<LD_Point*>& points) {
         points.push_back(point);
         haveX = false;
     });
+}
+
+bool parseFirstPoint(std::string_view text, LD_Point& point) {
+    double numbers[2] = {};
+    size_t count = 0;
+    // Only the first two tokens are read; the walk stops at the third.
+    while (!text.empty() && count < 2) {
+        size_t space = text.find(' ');
+        std::string_view token = text.substr(0, space);
+        if (!token.empty()) numbers[count++] = readNumber(token);
+        if (space == std::string_view::npos) break;
+        text.remove_prefix(space + 1);
+    }
+    if (count < 2) return false;
+    point.x = numbers[0];
+    point.y = numbers[1];
+    return true;
 }
 
 void parseBox(std::string_view text, LD_Box* box) {

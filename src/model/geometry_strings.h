@@ -44,6 +44,8 @@ public:
 // bytes; LD_JDF::parseStringAs... narrow their wide text and call these.
 namespace vorlan::geometry {
 void parsePoints(std::string_view text, std::vector<LD_Point*>& points);
+// The first point of the text into point (its text untouched); false when there is none.
+bool parseFirstPoint(std::string_view text, LD_Point& point);
 void parseBox(std::string_view text, LD_Box* box);
 void parseCTM(std::string_view text, LD_CTM* ctm);
 bool parseClipPath(std::string_view text, std::vector<LD_ClipPathOperations*>& ops);
