@@ -69,7 +69,7 @@ TEST(Expansion, ParametersMadeBeforeExpansionAreRefused) {
     w.contentRuns.push_back(new LD_Run);
     w.m_InterpretingParams.push_back(new LD_OCG_InterpretingParams);
     EXPECT_EQ(w.createRunListAndInterpretingParamPairs(true), LD_FAILED);
-    w.m_InterpretingParams.clear();
+    w.releaseInterpretingParams();
     w.contentRuns.push_back(nullptr);  // a hole in the run list
     EXPECT_EQ(w.createRunListAndInterpretingParamPairs(true), LD_FAILED);
 }
