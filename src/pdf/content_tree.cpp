@@ -5,6 +5,7 @@
 #include <qpdf/QPDFPageObjectHelper.hh>
 
 #include <exception>
+#include <stdexcept>
 #include <set>
 
 namespace vorlan::pdf {
@@ -180,7 +181,13 @@ private:
 
 std::string pipedBytes(QPDFObjectHandle owner) {
     Pl_Buffer buffer("content");
-    QPDFPageObjectHelper(owner).pipeContents(&buffer);
+    // Patterns and glyph procedures are content streams without the form dictionary entries that
+    // the page helper looks for: their data is piped directly.
+    if (owner.isStream()) {
+        if (!owner.pipeStreamData(&buffer, 0, qpdf_dl_generalized)) throw std::runtime_error("undecodable content");
+    } else {
+        QPDFPageObjectHelper(owner).pipeContents(&buffer);
+    }
     std::unique_ptr<Buffer> data(buffer.getBuffer());
     return std::string(reinterpret_cast<const char*>(data->getBuffer()), data->getSize());
 }

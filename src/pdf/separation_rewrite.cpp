@@ -1,0 +1,415 @@
+// Separation rewriting: colour operators, images, shadings, patterns, forms, Type 3 glyphs and
+// annotation appearances of every page.
+#include "pdf/separation_rewrite.h"
+
+#include <qpdf/QPDFObjectHandle.hh>
+
+#include <cstring>
+#include <exception>
+#include <map>
+#include <memory>
+#include <set>
+
+#include "pdf/content_edit.h"
+#include "pdf/content_tree.h"
+#include "pdf/form_variants.h"
+#include "pdf/pdf_document.h"
+#include "pdf/pdf_save.h"
+#include "pdf/pdf_session.h"
+#include "pdf/zipped_jdf_file_system.h"
+
+namespace vorlan::pdf {
+namespace {
+
+// Sets every process colour of the content's starting state to CMYK 0 0 0 0 (keep-listed mode).
+constexpr const char* kKnockOutStart = "0 0 0 0 k 0 0 0 0 K\n";
+
+bool isDelimiter(char c) { return std::strchr("()<>[]{}/%", c) != nullptr; }
+bool isSpace(char c) { return std::strchr(" \t\r\n\f", c) != nullptr || c == '\0'; }
+
+// The byte range of the name that follows /CS or /ColorSpace in an inline image's dictionary.
+bool inlineColourSpaceName(const std::string& bytes, size_t begin, size_t end, size_t& nameBegin, size_t& nameEnd) {
+    bool next = false;
+    for (size_t i = begin; i < end;) {
+        if (isSpace(bytes[i])) {
+            ++i;
+            continue;
+        }
+        size_t j = i + 1;
+        while (j < end && !isSpace(bytes[j]) && !isDelimiter(bytes[j])) ++j;
+        const std::string token = bytes.substr(i, j - i);
+        if (next) {
+            if (token.size() < 2 || token[0] != '/') return false;
+            nameBegin = i;
+            nameEnd = j;
+            return true;
+        }
+        if (token == "ID") return false;
+        next = token == "/CS" || token == "/ColorSpace";
+        i = j;
+    }
+    return false;
+}
+
+bool isProcessLike(const ColourSpaceRef& space) {
+    if (!space) return true;
+    switch (space->family) {
+        case ColourFamily::Separation:
+        case ColourFamily::DeviceN:
+        case ColourFamily::Pattern:
+            return false;
+        case ColourFamily::Indexed:
+            return isProcessLike(space->base);
+        default:
+            return true;
+    }
+}
+
+bool hasColorants(const ColourSpaceRef& space) {
+    if (!space) return false;
+    if (space->family == ColourFamily::Separation || space->family == ColourFamily::DeviceN) return true;
+    return (space->family == ColourFamily::Indexed || space->family == ColourFamily::Pattern) && hasColorants(space->base);
+}
+
+class SeparationRewriter {
+public:
+    SeparationRewriter(QPDF& pdf, const std::vector<std::string>& separations, bool keepListed)
+        : pdf_(pdf), listed_(separations.begin(), separations.end()), keep_(keepListed), variants_(pdf) {}
+
+    bool rewritePage(QPDFObjectHandle page) {
+        std::shared_ptr<Content> content = parsePageContent(page, &cache_);
+        ContentEditor editor(*content);
+        if (keep_) editor.insertText(0, kKnockOutStart);
+        rewrite(*content, content->elements, editor);
+        editor.apply(pdf_);
+        rewriteAnnotations(page, content->resources);
+        return content->complete;
+    }
+
+    void finish() { variants_.finish(); }
+
+private:
+    bool affected(const std::string& colorant) const {
+        if (colorant == "None") return false;
+        const bool listed = listed_.count(colorant) > 0;
+        return keep_ ? !listed && colorant != "All" : listed;
+    }
+
+    // ---- colour spaces -------------------------------------------------------------------------
+
+    // The replacement of a space with affected colorants (an indirect object, one per distinct
+    // original), or null when nothing in it changes. In keep-listed mode an uncoloured pattern
+    // over a process space gets a base that paints nothing.
+    QPDFObjectHandle replacement(const ColourSpaceRef& space) {
+        if (!space) return QPDFObjectHandle::newNull();
+        QPDFObjectHandle original = space->object;
+        if (!original.isInitialized() || original.isNull()) return QPDFObjectHandle::newNull();
+        const std::string key = original.unparse();
+        auto known = replacements_.find(key);
+        if (known != replacements_.end()) return known->second;
+        QPDFObjectHandle made = QPDFObjectHandle::newNull();
+        if (hasColorants(space)) {
+            QPDFObjectHandle rewritten = colorantsToNone(original, [this](const std::string& c) { return affected(c); });
+            if (!rewritten.isSameObjectAs(original)) made = pdf_.makeIndirectObject(rewritten);
+        } else if (keep_ && space->family == ColourFamily::Pattern && space->base && isProcessLike(space->base)) {
+            made = pdf_.makeIndirectObject(QPDFObjectHandle::newArray(
+                {QPDFObjectHandle::newName("/Pattern"), paintsNothing(space->base->components)}));
+        }
+        replacements_.emplace(key, made);
+        return made;
+    }
+
+    // [/DeviceN [/None ...] /DeviceCMYK {pop ... 0 0 0 0}] with n components: paints nothing.
+    QPDFObjectHandle paintsNothing(int components) {
+        const int n = components > 0 ? components : 1;
+        auto known = nothing_.find(n);
+        if (known != nothing_.end()) return known->second;
+        std::string names, domain, program = "{";
+        for (int i = 0; i < n; ++i) {
+            names += " /None";
+            domain += " 0 1";
+            program += " pop";
+        }
+        program += " 0 0 0 0 }";
+        QPDFObjectHandle fn = QPDFObjectHandle::newStream(&pdf_, program);
+        fn.getDict().replaceKey("/FunctionType", QPDFObjectHandle::newInteger(4));
+        fn.getDict().replaceKey("/Domain", QPDFObjectHandle::parse("[" + domain + " ]"));
+        fn.getDict().replaceKey("/Range", QPDFObjectHandle::parse("[0 1 0 1 0 1 0 1]"));
+        QPDFObjectHandle space = pdf_.makeIndirectObject(QPDFObjectHandle::newArray(
+            {QPDFObjectHandle::newName("/DeviceN"), QPDFObjectHandle::parse("[" + names + " ]"),
+             QPDFObjectHandle::newName("/DeviceCMYK"), fn}));
+        nothing_.emplace(n, space);
+        return space;
+    }
+
+    // ---- content -------------------------------------------------------------------------------
+
+    void rewrite(Content& content, const std::vector<ContentElement>& elements, ContentEditor& editor) {
+        rewriteFonts(content.resources);
+        for (auto e = elements.rbegin(); e != elements.rend(); ++e) {
+            switch (e->kind) {
+                case ElementKind::Group:
+                case ElementKind::MarkedContent:
+                case ElementKind::TextObject:
+                    rewrite(content, e->children, editor);
+                    break;
+                case ElementKind::Form:
+                    rewriteForm(*e, editor);
+                    break;
+                case ElementKind::State:
+                    rewriteColourOperator(content, *e, editor);
+                    break;
+                case ElementKind::Image:
+                    rewriteImage(*e, editor);
+                    break;
+                case ElementKind::InlineImage:
+                    rewriteInlineImage(content, *e, editor);
+                    break;
+                case ElementKind::Shading:
+                    if (shadingPaintsNothing(e->object)) editor.replace(e->begin, e->end, "");
+                    break;
+                default:
+                    break;  // paths and text runs paint with colours set by the operators
+            }
+        }
+    }
+
+    void rewriteColourOperator(Content& content, const ContentElement& e, ContentEditor& editor) {
+        const std::string& op = e.op;
+        const bool stroke = !op.empty() && (op[0] == 'C' || op[0] == 'S' || op[0] == 'G' || op[0] == 'R' || op[0] == 'K');
+        const ColourSpaceRef& space = stroke ? e.state.stroke : e.state.fill;
+        if (op == "cs" || op == "CS") {
+            if (keep_ && isProcessLike(space)) {
+                editor.replace(e.begin, e.end, stroke ? "/DeviceCMYK CS 0 0 0 0 SC" : "/DeviceCMYK cs 0 0 0 0 sc");
+                return;
+            }
+            QPDFObjectHandle rep = replacement(space);
+            if (!rep.isNull()) editor.replace(e.begin, e.opBegin, editor.resourceName("/ColorSpace", rep, "CS") + " ");
+        } else if (op == "sc" || op == "scn" || op == "SC" || op == "SCN") {
+            if (keep_ && isProcessLike(space)) {
+                editor.replace(e.begin, e.end, stroke ? "0 0 0 0 SC" : "0 0 0 0 sc");
+                return;
+            }
+            const std::string& pattern = stroke ? e.state.strokePattern : e.state.fillPattern;
+            if (space && space->family == ColourFamily::Pattern && !pattern.empty()) {
+                QPDFObjectHandle resources = content.resources;
+                QPDFObjectHandle patterns = resources.isDictionary() ? resources.getKey("/Pattern") : resources;
+                if (patterns.isDictionary()) rewritePattern(patterns, pattern, content.resources);
+            }
+        } else if (keep_ && (op == "g" || op == "rg" || op == "k")) {
+            editor.replace(e.begin, e.end, "0 0 0 0 k");
+        } else if (keep_ && (op == "G" || op == "RG" || op == "K")) {
+            editor.replace(e.begin, e.end, "0 0 0 0 K");
+        }
+    }
+
+    void rewriteImage(const ContentElement& e, ContentEditor& editor) {
+        QPDFObjectHandle image = e.object;
+        if (e.imageMask || !image.isStream()) return;  // a stencil paints with the fill colour
+        if (!hasColorants(e.ownSpace)) {
+            if (keep_) editor.replace(e.begin, e.end, "");
+            return;
+        }
+        if (!done_.insert(image.getObjGen()).second) return;
+        QPDFObjectHandle rep = replacement(e.ownSpace);
+        if (!rep.isNull()) image.getDict().replaceKey("/ColorSpace", rep);
+    }
+
+    void rewriteInlineImage(Content& content, const ContentElement& e, ContentEditor& editor) {
+        if (e.imageMask) return;
+        if (!hasColorants(e.ownSpace)) {
+            if (keep_) editor.replace(e.begin, e.end, "");
+            return;
+        }
+        QPDFObjectHandle rep = replacement(e.ownSpace);
+        size_t nameBegin = 0, nameEnd = 0;
+        if (rep.isNull() || !inlineColourSpaceName(content.bytes, e.begin + 2, e.end, nameBegin, nameEnd)) return;
+        editor.replace(nameBegin, nameEnd, editor.resourceName("/ColorSpace", rep, "CS"));
+    }
+
+    // Shadings have their own colour space, whatever the use: rewritten in place, once. True when
+    // the shading would paint nothing (every colorant None, or a process space in keep-listed
+    // mode): such shadings are taken out where they are used rather than painted in "None",
+    // which renderers do not all leave unmarked at the shading's edges.
+    bool shadingPaintsNothing(QPDFObjectHandle shading) {
+        const bool indirect = shading.isIndirect();
+        if (indirect) {
+            auto known = shadings_.find(shading.getObjGen());
+            if (known != shadings_.end()) return known->second;
+        }
+        bool nothing = false;
+        QPDFObjectHandle dict = shading.isStream() ? shading.getDict() : shading;
+        if (dict.isDictionary()) {
+            ColourSpaceResolver resolver(QPDFObjectHandle::newNull(), &cache_);
+            ColourSpaceRef space = resolver.byObject(dict.getKey("/ColorSpace"));
+            if (hasColorants(space)) {
+                nothing = true;
+                for (const std::string& c : space->colorants) nothing = nothing && (c == "None" || affected(c));
+                QPDFObjectHandle rep = nothing ? QPDFObjectHandle::newNull() : replacement(space);
+                if (!rep.isNull()) dict.replaceKey("/ColorSpace", rep);
+            } else {
+                nothing = keep_;
+            }
+        }
+        if (indirect) shadings_.emplace(shading.getObjGen(), nothing);
+        return nothing;
+    }
+
+    // A pattern that paints nothing: an empty coloured tiling.
+    QPDFObjectHandle emptyPattern() {
+        if (emptyPattern_.isNull()) {
+            emptyPattern_ = pdf_.makeIndirectObject(QPDFObjectHandle::newStream(&pdf_, std::string()));
+            emptyPattern_.getDict().replaceKey("/PatternType", QPDFObjectHandle::newInteger(1));
+            emptyPattern_.getDict().replaceKey("/PaintType", QPDFObjectHandle::newInteger(1));
+            emptyPattern_.getDict().replaceKey("/TilingType", QPDFObjectHandle::newInteger(1));
+            emptyPattern_.getDict().replaceKey("/BBox", QPDFObjectHandle::parse("[0 0 1 1]"));
+            emptyPattern_.getDict().replaceKey("/XStep", QPDFObjectHandle::newInteger(1));
+            emptyPattern_.getDict().replaceKey("/YStep", QPDFObjectHandle::newInteger(1));
+            emptyPattern_.getDict().replaceKey("/Resources", QPDFObjectHandle::newDictionary());
+        }
+        return emptyPattern_;
+    }
+
+    void rewritePattern(QPDFObjectHandle patterns, const std::string& name, QPDFObjectHandle parentResources) {
+        QPDFObjectHandle pattern = patterns.getKey(name);
+        if (pattern.isIndirect() && !done_.insert(pattern.getObjGen()).second) return;
+        QPDFObjectHandle dict = pattern.isStream() ? pattern.getDict() : pattern;
+        if (!dict.isDictionary()) return;
+        int type = 0, paint = 0;
+        dict.getKey("/PatternType").getValueAsInt(type);
+        dict.getKey("/PaintType").getValueAsInt(paint);
+        if (type == 2) {
+            if (!shadingPaintsNothing(dict.getKey("/Shading"))) return;
+            if (pattern.isIndirect()) pdf_.replaceObject(pattern.getObjGen(), emptyPattern());
+            else patterns.replaceKey(name, emptyPattern());
+        } else if (type == 1 && paint == 1 && pattern.isStream()) {
+            rewriteStreamInPlace(pattern, parentResources, keep_);
+        }
+    }
+
+    // Content that starts from its own state wherever it is used (coloured tiling patterns,
+    // Type 3 glyphs): edited in place.
+    void rewriteStreamInPlace(QPDFObjectHandle stream, QPDFObjectHandle parentResources, bool knockOutStart) {
+        std::shared_ptr<Content> content = parseFormContent(stream, parentResources, GraphicsState::initial(), &cache_);
+        ContentEditor editor(*content);
+        if (knockOutStart) editor.insertText(0, kKnockOutStart);
+        rewrite(*content, content->elements, editor);
+        editor.apply(pdf_);
+    }
+
+    // Type 3 glyphs may set their own colours (d0): their procedures are rewritten once per font.
+    void rewriteFonts(QPDFObjectHandle resources) {
+        QPDFObjectHandle fonts = resources.isDictionary() ? resources.getKey("/Font") : resources;
+        if (!fonts.isDictionary()) return;
+        for (auto& [name, font] : fonts.ditems()) {
+            if (!font.isDictionary() || !font.getKey("/Subtype").isNameAndEquals("/Type3")) continue;
+            QPDFObjectHandle procs = font.getKey("/CharProcs");
+            if (!procs.isDictionary()) continue;
+            if (procs.isIndirect() && !done_.insert(procs.getObjGen()).second) continue;
+            QPDFObjectHandle glyphResources = streamResources(QPDFObjectHandle::newNull(), resources);
+            QPDFObjectHandle own = font.getKey("/Resources");
+            if (own.isDictionary()) glyphResources = own;
+            for (auto& [glyph, proc] : procs.ditems())
+                if (proc.isStream() && done_.insert(proc.getObjGen()).second)
+                    rewriteStreamInPlace(proc, glyphResources, false);
+        }
+    }
+
+    void rewriteForm(const ContentElement& e, ContentEditor& parent) {
+        QPDFObjectHandle form = e.object;
+        if (!e.form || !form.isStream()) return;
+        Content& content = *e.form;
+        ContentEditor editor(content);
+        rewrite(content, content.elements, editor);
+        std::string bytes = editor.edited() ? editor.result() : content.bytes;
+        QPDFObjectHandle target = variants_.objectFor(form, content.bytes, std::move(bytes));
+        if (!target.isSameObjectAs(form))
+            parent.replace(e.begin, e.opBegin, parent.resourceName("/XObject", target, "Fm") + " ");
+    }
+
+    // Appearance streams are drawn from the initial state, like a form used at the page's start.
+    void rewriteAnnotations(QPDFObjectHandle page, QPDFObjectHandle pageResources) {
+        QPDFObjectHandle annots = page.getKey("/Annots");
+        if (!annots.isArray()) return;
+        for (QPDFObjectHandle annot : annots.aitems()) {
+            if (!annot.isDictionary()) continue;
+            QPDFObjectHandle ap = annot.getKey("/AP");
+            if (!ap.isDictionary()) continue;
+            for (const char* key : {"/N", "/R", "/D"}) {
+                QPDFObjectHandle entry = ap.getKey(key);
+                if (entry.isStream()) {
+                    QPDFObjectHandle target = rewriteAppearance(entry, pageResources);
+                    if (!target.isSameObjectAs(entry)) ap.replaceKey(key, target);
+                } else if (entry.isDictionary()) {
+                    for (auto& [state, stream] : entry.ditems()) {
+                        if (!stream.isStream()) continue;
+                        QPDFObjectHandle target = rewriteAppearance(stream, pageResources);
+                        if (!target.isSameObjectAs(stream)) entry.replaceKey(state, target);
+                    }
+                }
+            }
+        }
+    }
+
+    QPDFObjectHandle rewriteAppearance(QPDFObjectHandle stream, QPDFObjectHandle pageResources) {
+        std::shared_ptr<Content> content = parseFormContent(stream, pageResources, GraphicsState::initial(), &cache_);
+        ContentEditor editor(*content);
+        if (keep_) editor.insertText(0, kKnockOutStart);
+        rewrite(*content, content->elements, editor);
+        std::string bytes = editor.edited() ? editor.result() : content->bytes;
+        return variants_.objectFor(stream, content->bytes, std::move(bytes));
+    }
+
+    QPDF& pdf_;
+    std::set<std::string> listed_;
+    bool keep_;
+    FormVariants variants_;
+    ColourSpaceResolver::SharedCache cache_;
+    std::map<std::string, QPDFObjectHandle> replacements_;
+    std::map<int, QPDFObjectHandle> nothing_;
+    std::set<QPDFObjGen> done_;
+    std::map<QPDFObjGen, bool> shadings_;
+    QPDFObjectHandle emptyPattern_ = QPDFObjectHandle::newNull();
+};
+
+}  // namespace
+
+bool rewriteDocumentSeparations(QPDF& pdf, const std::vector<std::string>& separations, bool keepListed) {
+    SeparationRewriter rewriter(pdf, separations, keepListed);
+    bool result = true;
+    for (QPDFObjectHandle page : documentPages(pdf)) {
+        try {
+            if (!rewriter.rewritePage(page)) result = false;
+        } catch (const std::exception&) {
+            result = false;
+        }
+    }
+    try {
+        rewriter.finish();
+    } catch (const std::exception&) {
+        result = false;
+    }
+    return result;
+}
+
+int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output,
+                       const std::vector<std::string>& separations, bool keepListed) {
+    if (fs) ensurePdfLibraryStarted(fs);
+    if (!input || !*input || !output || !*output) return 1;
+    const std::filesystem::path target = prepareOutputPath(output);
+    if (target.empty()) return 1;
+    std::unique_ptr<QPDF> pdf = openDocument(input, false);
+    if (!pdf) return 1;
+    const bool rewritten = rewriteDocumentSeparations(*pdf, separations, keepListed);
+    return rewritten && saveDocument(*pdf, target) ? 0 : 1;
+}
+
+int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output, const char* const* separations,
+                       int count, bool keepListed) {
+    std::vector<std::string> list;
+    for (int i = 0; i < count; ++i)
+        if (separations && separations[i]) list.emplace_back(separations[i]);
+    return rewriteSeparations(fs, input, output, list, keepListed);
+}
+
+}  // namespace vorlan::pdf

@@ -1,0 +1,36 @@
+// Separation rewriting for spot mode: variants of a PDF in which chosen separations print
+// nothing (drop-listed) or only the chosen ones print (keep-listed).
+//
+// Colorants are replaced by the colorant "None", which makes no marks: in Separation and DeviceN
+// colour spaces (NChannel /Colorants included), through Indexed bases and the underlying spaces
+// of uncoloured patterns, in images, shadings and shading patterns, and in the content of forms,
+// coloured tiling patterns, Type 3 glyphs and annotation appearances. In keep-listed mode process
+// colours are also knocked out: colour operators in process spaces paint CMYK 0 0 0 0, images in
+// process spaces are removed, and shadings in process spaces are given a colour space of "None"
+// colorants, so that they paint nothing.
+#pragma once
+
+#include <qpdf/QPDF.hh>
+
+#include <string>
+#include <vector>
+
+struct ZippedJDFFileSystem;
+
+namespace vorlan::pdf {
+
+// Rewrites every page of an open document. A colorant is listed when it equals an entry exactly.
+// keep-listed: every colorant that is not listed and not "All" becomes "None"; drop-listed: every
+// listed colorant becomes "None". False when a page could not be read to its end (the pages are
+// still rewritten as far as they were read). Never throws.
+bool rewriteDocumentSeparations(QPDF& pdf, const std::vector<std::string>& separations, bool keepListed);
+
+// Opens `input` (no repair), rewrites it and saves it linearised to `output` (created with its
+// folders; replaced only when the new file is complete). 0 when the document was rewritten and
+// saved, 1 otherwise. Starts the PDF session through the file context's flag (may be null).
+int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output,
+                       const std::vector<std::string>& separations, bool keepListed);
+int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output, const char* const* separations,
+                       int count, bool keepListed);
+
+}  // namespace vorlan::pdf
