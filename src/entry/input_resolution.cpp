@@ -1,4 +1,5 @@
 // What the job's data path is, and where its ticket and PDFs lie in the job folder.
+#include <cctype>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -103,6 +104,13 @@ wchar_t* LD_JDF::getNativeFilePath(wchar_t* path) {
     std::string text = narrow(path);
     for (char& c : text)
         if (c == '\\') c = '/';
+    bool windowsDrive = text.size() >= 2 && std::isalpha(static_cast<unsigned char>(text[0])) && text[1] == ':';
+    if (!text.empty() && text[0] != '/' && !windowsDrive) {
+        // A relative path means nothing to the press: anchor it at the current folder.
+        std::error_code ec;
+        fs::path absolute = fs::absolute(text, ec);
+        if (!ec) text = absolute.lexically_normal().string();
+    }
     // Every URL gets exactly three slashes: POSIX paths bring their own leading one.
     std::string url = (!text.empty() && text[0] == '/' ? "file://" : "file:///") + text;
     lastError = LD_OK;

@@ -121,6 +121,10 @@ TEST(PathHelpers, NativeFilePathHasThreeSlashes) {
     EXPECT_EQ(std::wstring(b), L"file:///C:/jobs/a.pdf");
     std::free(a);
     std::free(b);
+    wchar_t relative[] = L"out/./b.pdf";
+    wchar_t* c = worker.getNativeFilePath(relative);
+    EXPECT_EQ(std::wstring(c), L"file://" + vorlan::os::widen((fs::current_path() / "out" / "b.pdf").c_str()));
+    std::free(c);
     EXPECT_EQ(worker.getNativeFilePath(nullptr), nullptr);
     EXPECT_EQ(worker.JDF_GetLastErrorCode(), LD_FAILED);
 }

@@ -74,6 +74,7 @@ int runConsume(Args args) {
     if (namer.folder.empty()) namer.folder = ".";
     std::error_code madeEc;
     fs::create_directories(namer.folder, madeEc);
+    namer.folder = fs::absolute(namer.folder, madeEc);  // the ticket stores these paths as URLs
 
     std::vector<char> outputBuffer(output.begin(), output.end());
     outputBuffer.push_back('\0');
