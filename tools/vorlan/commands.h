@@ -11,5 +11,7 @@ int runAutoimpose(Args args);
 int runScanXmp(Args args);
 int runJobAttr(Args args);
 int runInspect(Args args);
+int runConvertPdf(Args args);
+int runRewriteSeps(Args args);
 
 }  // namespace vorlan::cli

@@ -20,6 +20,8 @@ void printUsage() {
         "  scan-xmp    scan a PDF's inks into a version description\n"
         "  job-attr    read or set a job attribute in the local job store\n"
         "  inspect     print what the query interface sees of a JDF ticket\n"
+        "  convert-pdf put a PDF's separations into optional-content groups\n"
+        "  rewrite-seps write a PDF variant that keeps or drops listed separations\n"
         "\n"
         "Run 'vorlan <command> --help' for a command's arguments. The exit status is the result code.");
 }
@@ -40,6 +42,8 @@ int main(int argc, char** argv) {
     if (command == "scan-xmp") return vorlan::cli::runScanXmp(args);
     if (command == "job-attr") return vorlan::cli::runJobAttr(args);
     if (command == "inspect") return vorlan::cli::runInspect(args);
+    if (command == "convert-pdf") return vorlan::cli::runConvertPdf(args);
+    if (command == "rewrite-seps") return vorlan::cli::runRewriteSeps(args);
     std::fprintf(stderr, "vorlan: unknown command '%s'\n\n", command.c_str());
     printUsage();
     return 2;

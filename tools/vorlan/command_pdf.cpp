@@ -1,0 +1,81 @@
+// vorlan convert-pdf and rewrite-seps: the two PDF operations of versioned jobs on one file.
+#include <cstdio>
+#include <string>
+#include <vector>
+
+#include "commands.h"
+#include "pdf/separation_layers.h"
+#include "pdf/separation_rewrite.h"
+
+namespace vorlan::cli {
+namespace {
+
+std::vector<std::string> splitList(const std::string& text) {
+    std::vector<std::string> names;
+    size_t start = 0;
+    while (start <= text.size() && !text.empty()) {
+        size_t comma = text.find(',', start);
+        if (comma == std::string::npos) comma = text.size();
+        if (comma > start) names.push_back(text.substr(start, comma - start));
+        start = comma + 1;
+    }
+    return names;
+}
+
+std::vector<const char*> pointers(const std::vector<std::string>& names) {
+    std::vector<const char*> out;
+    for (const std::string& n : names) out.push_back(n.c_str());
+    return out;
+}
+
+int finish(int result, bool json, const char* operation, const std::string& output) {
+    if (json)
+        std::printf("{\"result\": %d, \"operation\": %s, \"output\": %s, \"written\": %s}\n", result,
+                    jsonString(operation).c_str(), jsonString(output).c_str(), result == 0 ? "true" : "false");
+    else
+        std::printf("%s: %s (%s)\n", operation, result == 0 ? "written" : "failed", output.c_str());
+    return result;
+}
+
+}  // namespace
+
+int runConvertPdf(Args args) {
+    const bool json = takeFlag(args, "--json");
+    const std::vector<std::string> seps = splitList(takeOption(args, "--seps", ""));
+    const std::vector<std::string> layers = splitList(takeOption(args, "--layers", ""));
+    if (wantsHelp(args) || args.size() != 2) {
+        std::fputs("usage: vorlan convert-pdf [--seps A,B] [--layers X,Y] [--json] IN OUT\n\n"
+                   "Writes OUT: IN with every element that paints with a listed separation in an optional-\n"
+                   "content group of that name, and all other content not already under optional content in\n"
+                   "the group \"KVVersionSpecialOCGName\"; the new groups start OFF. --layers names the PDF's\n"
+                   "own layers; without it, content already in layers is grouped as well and the layer order\n"
+                   "lists only the new groups. Exit status 0 when OUT was written, else 1.\n",
+                   wantsHelp(args) ? stdout : stderr);
+        return wantsHelp(args) ? 0 : 2;
+    }
+    std::vector<const char*> s = pointers(seps), l = pointers(layers);
+    const int result = vorlan::pdf::convertPDF(nullptr, args[0].c_str(), args[1].c_str(), s.data(), l.data(),
+                                               static_cast<int>(s.size()), static_cast<int>(l.size()));
+    return finish(result, json, "convert-pdf", args[1]);
+}
+
+int runRewriteSeps(Args args) {
+    const bool json = takeFlag(args, "--json");
+    const std::string keep = takeOption(args, "--keep", "\x01");
+    const std::string drop = takeOption(args, "--drop", "\x01");
+    const bool keepListed = keep != "\x01";
+    if (wantsHelp(args) || args.size() != 2 || keepListed == (drop != "\x01")) {
+        std::fputs("usage: vorlan rewrite-seps (--keep A,B | --drop A,B) [--json] IN OUT\n\n"
+                   "Writes OUT: IN with separations replaced by the colorant None. --drop: the listed\n"
+                   "separations print nothing, everything else stays. --keep: only the listed separations\n"
+                   "print; other separations, process colours and process-colour images are taken out.\n"
+                   "Names are compared exactly. Exit status 0 when OUT was written, else 1.\n",
+                   wantsHelp(args) ? stdout : stderr);
+        return wantsHelp(args) ? 0 : 2;
+    }
+    const std::vector<std::string> list = splitList(keepListed ? keep : drop);
+    const int result = vorlan::pdf::rewriteSeparations(nullptr, args[0].c_str(), args[1].c_str(), list, keepListed);
+    return finish(result, json, "rewrite-seps", args[1]);
+}
+
+}  // namespace vorlan::cli
