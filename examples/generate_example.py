@@ -108,30 +108,33 @@ LAYERS = """  <OptionalLayer pdfIndex="0" OCGName="English" displayName="English
   <OptionalLayer pdfIndex="0" OCGName="Die" displayName="Die line" isSep="false" isNested="false" default="false"/>
 """
 
-# Surfaces 0 and 1 (sheet 1) are English, 2 and 3 (sheet 2) German; content object n sits on
-# surface n.
-DESCRIPTION = """<?xml version="1.0" encoding="UTF-8"?>
-<OptionalContentGroupData DefaultLayerMode="true" export="true">
-""" + LAYERS + """  <Versions>
-    <Version name="English" enable="true" copies="500">
-      <Surface index="0"><ContentObject index="0" LayerNameOn="English" LayerNameOff="German"/></Surface>
-      <Surface index="1"><ContentObject index="1" LayerNameOn="English" LayerNameOff="German"/></Surface>
-    </Version>
-    <Version name="German" enable="true" copies="300">
-      <Surface index="2"><ContentObject index="2" LayerNameOn="German" LayerNameOff="English"/></Surface>
-      <Surface index="3"><ContentObject index="3" LayerNameOn="German" LayerNameOff="English"/></Surface>
-    </Version>
-  </Versions>
-  <DieCut name="Die" enable="true">
+VERSIONS = (("English", 500, "English", "German"), ("German", 300, "German", "English"))
+
+
+def description(surfaces_of_version, die_cut=""):
+    """A layer-mode description: version v switches its layer on for the surfaces in
+    surfaces_of_version[v] (content object n sits on surface n)."""
+    versions = ""
+    for (name, copies, on, off), surfaces in zip(VERSIONS, surfaces_of_version):
+        versions += '    <Version name="%s" enable="true" copies="%d">\n' % (name, copies)
+        for n in surfaces:
+            versions += ('      <Surface index="%d"><ContentObject index="%d" LayerNameOn="%s" LayerNameOff="%s"/>'
+                         '</Surface>\n' % (n, n, on, off))
+        versions += "    </Version>\n"
+    return ('<?xml version="1.0" encoding="UTF-8"?>\n'
+            '<OptionalContentGroupData DefaultLayerMode="true" export="true">\n'
+            + LAYERS + "  <Versions>\n" + versions + "  </Versions>\n" + die_cut
+            + "</OptionalContentGroupData>\n")
+
+
+# Surfaces 0 and 1 (sheet 1) are English, 2 and 3 (sheet 2) German.
+DESCRIPTION = description(((0, 1), (2, 3)), """  <DieCut name="Die" enable="true">
     <Surface index="0" dieLayerInternalNames="Die" dieSepInternalNames=""/>
   </DieCut>
-</OptionalContentGroupData>
-"""
+""")
 
 # The bare PDF: each version names the PDF's pages (surface n = page n).
-BARE_DESCRIPTION = """<?xml version="1.0" encoding="UTF-8"?>
-<OptionalContentGroupData DefaultLayerMode="true" export="true">
-""" + LAYERS + """  <Versions>
+BARE_DESCRIPTION = description(((0, 1), (0, 1))) + LAYERS + """  <Versions>
     <Version name="English" enable="true" copies="500">
       <Surface index="0"><ContentObject index="0" LayerNameOn="English" LayerNameOff="German"/></Surface>
       <Surface index="1"><ContentObject index="1" LayerNameOn="English" LayerNameOff="German"/></Surface>

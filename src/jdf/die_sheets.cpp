@@ -150,26 +150,24 @@ LD_Surface* LD_JDF::findContentSurfaceByOriginalIndex(int32_t n) {
     return nullptr;
 }
 
-LD_Signature* LD_JDF::getSignatureByIndex(int32_t index) {
-    for (LD_Signature* signature : signatures)
-        if (signature && signature->index == index) return signature;
+namespace {
+
+// The first record of list whose index field equals index, or null.
+template <typename Record, typename Field>
+Record* firstWithIndex(const std::vector<Record*>& list, Field Record::*field, int32_t index) {
+    for (Record* record : list)
+        if (record && record->*field == index) return record;
     return nullptr;
 }
 
-LD_Sheet* LD_JDF::getSheetByIndex(int32_t index) {
-    for (LD_Sheet* sheet : sheets)
-        if (sheet && sheet->index == index) return sheet;
-    return nullptr;
-}
+}  // namespace
 
-LD_Surface* LD_JDF::getSurfaceByIndex(int32_t index) {
-    for (LD_Surface* surface : surfaces)
-        if (surface && surface->index == index) return surface;
-    return nullptr;
-}
+LD_Signature* LD_JDF::getSignatureByIndex(int32_t index) { return firstWithIndex(signatures, &LD_Signature::index, index); }
+
+LD_Sheet* LD_JDF::getSheetByIndex(int32_t index) { return firstWithIndex(sheets, &LD_Sheet::index, index); }
+
+LD_Surface* LD_JDF::getSurfaceByIndex(int32_t index) { return firstWithIndex(surfaces, &LD_Surface::index, index); }
 
 LD_ContentObject* LD_JDF::getContentObjectByIndex(int32_t index) {
-    for (LD_ContentObject* object : contentObjects)
-        if (object && object->contentObjectIndex == index) return object;
-    return nullptr;
+    return firstWithIndex(contentObjects, &LD_ContentObject::contentObjectIndex, index);
 }
