@@ -12,6 +12,7 @@
 
 #include <pugixml.hpp>
 
+#include "jdf/element_walk.h"
 #include "jdf/ticket_handles.h"
 #include "jdf/ticket_reading.h"
 #include "model/geometry_strings.h"
@@ -27,10 +28,6 @@ wchar_t* copyText(const JDF::WString& text) {
     wchar_t* copy = LD_CopyText(text.c_str());
     if (!copy) throw OutOfText{};
     return copy;
-}
-
-bool named(const JDF::KElement& e, const wchar_t* name) {
-    return vorlan::os::equalsIgnoreCase(e.GetLocalName().c_str(), name);
 }
 
 // Placed objects are many: they are read straight from the document's UTF-8 bytes, without
@@ -54,10 +51,45 @@ bool isAscii(const char* text) {
     return true;
 }
 
+// The element's local name equals name (ASCII) ignoring case, as the wide comparison has it;
+// names beyond ASCII are compared in wide form.
 bool namedNode(pugi::xml_node n, const char* name) {
-    const char* qualified = n.name();
-    const char* colon = std::strchr(qualified, ':');
-    return vorlan::os::equalsIgnoreCaseAscii(colon ? colon + 1 : qualified, name);
+    const char* local = localName(n);
+    if (vorlan::os::equalsIgnoreCaseAscii(local, name)) return true;
+    if (isAscii(local)) return false;
+    return vorlan::os::equalsIgnoreCase(JDF::WString(local).c_str(), JDF::WString(name).c_str());
+}
+
+bool named(const JDF::KElement& e, const char* name) { return namedNode(e.node(), name); }
+
+// LD_SetTextBuffer of the UTF-8 text, without a wide copy on the way for ASCII text.
+void setTextBuffer(wchar_t* buffer, const char* text) {
+    if (!isAscii(text)) {
+        LD_SetTextBuffer(buffer, JDF::WString(text).c_str());
+        return;
+    }
+    size_t i = 0;
+    for (; text[i] && i < LD_TEXT_BUFFER_CHARS - 1; ++i) buffer[i] = static_cast<wchar_t>(text[i]);
+    buffer[i] = L'\0';
+}
+
+// Calls fn(child) for each child element as JDFElement::GetChildElementVector(L"*", L"*") gives
+// them. That replaces a child that refers to another element (a ...Ref with rRef) by the element
+// it refers to; without such a child the document's nodes are taken as they stand.
+template <typename Fn>
+void forEachChildElement(const JDF::KElement& element, Fn fn) {
+    pugi::xml_node node = element.node();
+    for (pugi::xml_node c = node.first_child(); c; c = c.next_sibling()) {
+        if (c.type() != pugi::node_element) continue;
+        const char* local = localName(c);
+        size_t length = std::strlen(local);
+        if (length > 3 && std::strcmp(local + length - 3, "Ref") == 0 && c.attribute("rRef")) {
+            for (const JDF::KElement& child : JDF::JDFElement(element).GetChildElementVector(L"*", L"*")) fn(child);
+            return;
+        }
+    }
+    for (pugi::xml_node c = node.first_child(); c; c = c.next_sibling())
+        if (c.type() == pugi::node_element) fn(JDF::KElement(c, element.document()));
 }
 
 // An attribute as JDFResource::GetAttribute finds it: on the element, else on the enclosing
@@ -157,30 +189,30 @@ public:
     void readLayout(const JDF::KElement& layout) {
         (void)layout.GetAttribute(L"PartIDKeys");  // read, not used: the element names decide
         for (const JDF::KElement& child : layout.GetChildrenByTagName(L"*", L"*"))
-            if (named(child, L"Layout") || named(child, L"Signature")) readSignature(child);
+            if (named(child, "Layout") || named(child, "Signature")) readSignature(child);
     }
 
 private:
     void readSignature(const JDF::KElement& element) {
         auto* signature = new LD_Signature;
         w_.signatures.push_back(signature);
-        bool nested = named(element, L"Signature");
-        LD_SetTextBuffer(signature->name, element.GetAttribute(nested ? L"Name" : L"SignatureName").c_str());
+        bool nested = named(element, "Signature");
+        setTextBuffer(signature->name, element.node().attribute(nested ? "Name" : "SignatureName").value());
         signature->index = w_.numberOfSignatures;
         signature->sheetRange.first = w_.numberOfSheets;
 
         int32_t number = 1;
-        for (const JDF::KElement& child : JDF::JDFElement(element).GetChildElementVector(L"*", L"*")) {
-            if (named(child, L"Layout") || named(child, L"Sheet")) {
+        forEachChildElement(element, [&](const JDF::KElement& child) {
+            if (named(child, "Layout") || named(child, "Sheet")) {
                 readSheet(child, *signature, number);
                 ++number;
                 ++w_.numberOfSheets;
-            } else if (named(child, L"Media")) {
+            } else if (named(child, "Media")) {
                 if (!signature->media) signature->media = new LD_OCG_Media;
                 w_.parseMediaNode(JDF::JDFMedia(child), signature->media);
             }
             signature->sheetRange.last = w_.numberOfSheets - 1;
-        }
+        });
         ++w_.numberOfSignatures;
     }
 
@@ -191,19 +223,19 @@ private:
         sheet->index = w_.numberOfSheets;
         sheet->numberInSignature = number;
         sheet->signatureIndex = signature.index;
-        bool nested = named(element, L"Sheet");
-        LD_SetTextBuffer(sheet->name, element.GetAttribute(nested ? L"Name" : L"SheetName").c_str());
+        bool nested = named(element, "Sheet");
+        setTextBuffer(sheet->name, element.node().attribute(nested ? "Name" : "SheetName").value());
 
-        for (const JDF::KElement& child : JDF::JDFElement(element).GetChildElementVector(L"*", L"*")) {
-            if (named(child, L"Layout") || named(child, L"Surface")) {
+        forEachChildElement(element, [&](const JDF::KElement& child) {
+            if (named(child, "Layout") || named(child, "Surface")) {
                 readSurface(child, *sheet);
                 ++w_.numberOfSurfaces;
-            } else if (named(child, L"Media")) {
+            } else if (named(child, "Media")) {
                 delete sheet->media;  // a later Media child replaces an earlier one
                 sheet->media = new LD_OCG_Media;
                 w_.parseMediaNode(JDF::JDFMedia(child), sheet->media);
             }
-        }
+        });
     }
 
     // Puts the surface into its side's slot; a surface already there stays in the surface

@@ -61,15 +61,20 @@ bool hasLinkWithUsage(const JDF::JDFResource& resource, const char* usage) {
     if (!*id) return false;
     std::string refName = std::string(resource.node().name()) + "Ref";
     bool prefixedRef = refName.find(':') != std::string::npos;
-    pugi::xml_node top = resource.GetDocRoot().node();
+    auto refersHere = [&](pugi::xml_node link) {
+        return std::strcmp(link.attribute("rRef").value(), id) == 0 &&
+               sameUsage(link.attribute("ProcessUsage").value(), usage);
+    };
     bool found = false;
-    vorlan::jdf::forEachElementBelow(top, [&](pugi::xml_node n) {
-        pugi::xml_node parent = n.parent();
-        bool inPool = parent != top && std::strcmp(vorlan::jdf::localName(parent), "ResourceLinkPool") == 0;
-        bool isRef = refName == (prefixedRef ? n.name() : vorlan::jdf::localName(n));
-        if ((inPool || isRef) && std::strcmp(n.attribute("rRef").value(), id) == 0 &&
-            sameUsage(n.attribute("ProcessUsage").value(), usage))
-            found = true;
+    vorlan::jdf::forEachElementBelow(resource.GetDocRoot().node(), [&](pugi::xml_node n) {
+        const char* local = vorlan::jdf::localName(n);
+        // The pool's own children are looked at here; the walk goes on into them anyway.
+        if (*local == 'R' && std::strcmp(local, "ResourceLinkPool") == 0) {
+            for (pugi::xml_node link = n.first_child(); link && !found; link = link.next_sibling())
+                found = link.type() == pugi::node_element && refersHere(link);
+        }
+        const char* name = prefixedRef ? n.name() : local;
+        if (!found && *name == refName[0] && refName == name) found = refersHere(n);
         return !found;
     });
     return found;

@@ -32,7 +32,8 @@ bool readPlainDecimal(const char* p, const char* end, double& value) {
     }
     if (digits == 0 || digits > 15 || fraction > 22) return false;
     if (p < end && (*p == 'e' || *p == 'E')) return false;
-    value = static_cast<double>(mantissa) / kPowers[fraction];
+    value = static_cast<double>(mantissa);
+    if (fraction > 0) value /= kPowers[fraction];
     return true;
 }
 
