@@ -272,7 +272,11 @@ private:
 
     void rewritePattern(QPDFObjectHandle patterns, const std::string& name, QPDFObjectHandle parentResources) {
         QPDFObjectHandle pattern = patterns.getKey(name);
-        if (pattern.isIndirect() && !done_.insert(pattern.getObjGen()).second) return;
+        if (pattern.isIndirect()) {
+            // A pattern that paints nothing is replaced where it is listed, in every listing.
+            if (emptied_.count(pattern.getObjGen())) patterns.replaceKey(name, emptyPattern());
+            if (!done_.insert(pattern.getObjGen()).second) return;
+        }
         QPDFObjectHandle dict = pattern.isStream() ? pattern.getDict() : pattern;
         if (!dict.isDictionary()) return;
         int type = 0, paint = 0;
@@ -280,8 +284,8 @@ private:
         dict.getKey("/PaintType").getValueAsInt(paint);
         if (type == 2) {
             if (!shadingPaintsNothing(dict.getKey("/Shading"))) return;
-            if (pattern.isIndirect()) pdf_.replaceObject(pattern.getObjGen(), emptyPattern());
-            else patterns.replaceKey(name, emptyPattern());
+            if (pattern.isIndirect()) emptied_.insert(pattern.getObjGen());
+            patterns.replaceKey(name, emptyPattern());
         } else if (type == 1 && paint == 1 && pattern.isStream()) {
             rewriteStreamInPlace(pattern, parentResources, keep_);
         }
@@ -369,6 +373,7 @@ private:
     std::map<int, QPDFObjectHandle> nothing_;
     std::set<QPDFObjGen> done_;
     std::map<QPDFObjGen, bool> shadings_;
+    std::set<QPDFObjGen> emptied_;
     QPDFObjectHandle emptyPattern_ = QPDFObjectHandle::newNull();
 };
 

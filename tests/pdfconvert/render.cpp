@@ -69,6 +69,20 @@ bool showOnlyGroups(const std::string& in, const std::string& out, const std::ve
     }
 }
 
+std::vector<std::string> allGroups(const std::string& path) {
+    std::vector<std::string> names;
+    try {
+        QPDF pdf;
+        pdf.processFile(path.c_str());
+        QPDFObjectHandle ocgs = pdf.getRoot().getKey("/OCProperties").getKey("/OCGs");
+        if (ocgs.isArray())
+            for (QPDFObjectHandle item : ocgs.aitems())
+                if (item.isDictionary()) names.push_back(item.getKey("/Name").getUTF8Value());
+    } catch (const std::exception&) {
+    }
+    return names;
+}
+
 std::vector<std::string> groupOrder(const std::string& path) {
     std::vector<std::string> names;
     try {

@@ -22,6 +22,9 @@ GreyImage renderPage(const std::string& pdf, int page, int dpi = 36);
 // hides every other group of the document (/OFF). False on failure.
 bool showOnlyGroups(const std::string& in, const std::string& out, const std::vector<std::string>& names);
 
+// The names of all groups of the document (/OCProperties /OCGs).
+std::vector<std::string> allGroups(const std::string& pdf);
+
 // The names of the groups listed at the top level of the default configuration's /Order.
 std::vector<std::string> groupOrder(const std::string& pdf);
 
