@@ -82,7 +82,8 @@ void addRun(RunListReading& reading, bool marks, std::unique_ptr<LD_Run> run, st
 
 void readRunListResource(RunListReading& reading, const JDF::JDFResource& resource) {
     LD_JDF& w = reading.worker;
-    bool marks = w.isProcessUsageMarks(resource);
+    bool marks = reading.linkCandidates ? hasLinkWithUsage(resource, "Marks", *reading.linkCandidates)
+                                        : w.isProcessUsageMarks(resource);
     JDF::JDFRunList runList(resource);
 
     if (vorlan::os::equalsIgnoreCase(resource.KElement::GetAttribute(L"PartIDKeys").c_str(), L"Run")) {

@@ -5,6 +5,7 @@
 #include <cstring>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "jdf/element_walk.h"
 #include "jdf/ticket_handles.h"
@@ -19,26 +20,79 @@ JDF::KElement firstBelow(const JDF::KElement& from, const wchar_t* name, const w
     return from.GetChildByTagName(name, nameSpace, 0, JDF::JDFAttributeMap(), false, true);
 }
 
+constexpr const char* kParameterNames[] = {"InterpretingParams", "RenderingParams", "DigitalPrintingParams"};
+
+JDF::KElement* parameterSlot(LD_JDFHandles& t, int k) {
+    JDF::KElement* const slots[] = {&t.interpretingParamsElement, &t.renderingParamsElement,
+                                    &t.digitalPrintingParamsElement};
+    return slots[k];
+}
+
+// The parameter resource of that local name, or -1.
+int parameterIndex(const char* local) {
+    for (int k = 0; k < 3; ++k)
+        if (*local == *kParameterNames[k] && std::strcmp(local, kParameterNames[k]) == 0) return k;
+    return -1;
+}
+
 // The first InterpretingParams, RenderingParams and DigitalPrintingParams below the root, each
 // as firstBelow finds it, in one walk: absent ones would otherwise cost a walk of the whole
 // document each.
 void findParameterResources(LD_JDFHandles& t) {
-    static const char* const names[] = {"InterpretingParams", "RenderingParams", "DigitalPrintingParams"};
-    JDF::KElement* const slots[] = {&t.interpretingParamsElement, &t.renderingParamsElement,
-                                    &t.digitalPrintingParamsElement};
-    for (JDF::KElement* slot : slots) *slot = JDF::KElement();
+    for (int k = 0; k < 3; ++k) *parameterSlot(t, k) = JDF::KElement();
     int missing = 3;
     vorlan::jdf::forEachElementBelow(t.rootNode.node(), [&](pugi::xml_node n) {
-        const char* local = vorlan::jdf::localName(n);
-        for (int k = 0; k < 3; ++k) {
-            if (slots[k]->isNull() && std::strcmp(local, names[k]) == 0) {
-                *slots[k] = JDF::KElement(n, t.rootNode.document());
-                --missing;
-            }
+        int k = parameterIndex(vorlan::jdf::localName(n));
+        if (k >= 0 && parameterSlot(t, k)->isNull()) {
+            *parameterSlot(t, k) = JDF::KElement(n, t.rootNode.document());
+            --missing;
         }
         return missing > 0;
     });
 }
+
+bool endsWithRef(const char* name) {
+    size_t length = std::strlen(name);
+    return length >= 3 && std::memcmp(name + length - 3, "Ref", 3) == 0;
+}
+
+// What the reader asks of the whole document, gathered in one walk of it right after parsing
+// (a walk costs about a fifth of the parse on a large ticket):
+//  - whether any element has Automated="true": without one, no layout can be automated, and
+//    the look-up that would build the document's ID index is not needed;
+//  - the first parameter resources below the root, when the root is the document element;
+//  - the elements that may link a resource, for the run lists' ProcessUsage.
+// Valid while the document is unchanged.
+struct DocumentSurvey {
+    bool automatedTrue = false;
+    bool parametersFound = false;  // the three slots below hold findParameterResources' answer
+    JDF::KElement parameters[3];
+    std::vector<vorlan::jdf::LinkCandidate> links;
+
+    explicit DocumentSurvey(const LD_JDFHandles& t) {
+        pugi::xml_node top = t.rootNode.GetDocRoot().node();
+        if (!top) return;
+        parametersFound = top == t.rootNode.node();
+        automatedTrue = isAutomatedTrue(top);
+        vorlan::jdf::forEachElementBelow(top, [&](pugi::xml_node n) {
+            if (!automatedTrue) automatedTrue = isAutomatedTrue(n);
+            const char* local = vorlan::jdf::localName(n);
+            if (parametersFound) {
+                int k = parameterIndex(local);
+                if (k >= 0 && parameters[k].isNull()) parameters[k] = JDF::KElement(n, t.rootNode.document());
+            }
+            if (*local == 'R' && std::strcmp(local, "ResourceLinkPool") == 0) {
+                for (pugi::xml_node c = n.first_child(); c; c = c.next_sibling())
+                    if (c.type() == pugi::node_element) links.push_back({c, true});
+            }
+            if (endsWithRef(n.name())) links.push_back({n, false});
+            return true;
+        });
+    }
+
+private:
+    static bool isAutomatedTrue(pugi::xml_node n) { return std::strcmp(n.attribute("Automated").value(), "true") == 0; }
+};
 
 // Whether a ProcessUsage value equals usage (ASCII) ignoring case, as the wide comparison
 // has it; text beyond ASCII is compared in wide form.
@@ -50,35 +104,61 @@ bool sameUsage(const char* value, const char* usage) {
     return false;
 }
 
-// Whether a link to the resource has that ProcessUsage: an element of a ResourceLinkPool, or a
-// <resource name>Ref element, whose rRef is the resource root's ID (the links GetLinks finds),
-// looked for in one walk of the document.
-bool hasLinkWithUsage(const JDF::JDFResource& resource, const char* usage) {
-    if (resource.isNull()) return false;
-    JDF::JDFResource root = resource.GetResourceRoot();
-    pugi::xml_attribute idAttribute = root.node().attribute("ID");
-    const char* id = idAttribute.value();
-    if (!*id) return false;
-    std::string refName = std::string(resource.node().name()) + "Ref";
-    bool prefixedRef = refName.find(':') != std::string::npos;
-    auto refersHere = [&](pugi::xml_node link) {
-        return std::strcmp(link.attribute("rRef").value(), id) == 0 &&
-               sameUsage(link.attribute("ProcessUsage").value(), usage);
-    };
+// The links GetLinks finds for a resource: elements of a ResourceLinkPool, and
+// <resource name>Ref elements, whose rRef is the resource root's ID.
+class LinkMatch {
+public:
+    explicit LinkMatch(const JDF::JDFResource& resource) {
+        if (resource.isNull()) return;
+        id_ = resource.GetResourceRoot().node().attribute("ID").value();
+        refName_ = std::string(resource.node().name()) + "Ref";
+        prefixedRef_ = refName_.find(':') != std::string::npos;
+    }
+    bool possible() const { return *id_ != '\0'; }
+    bool isRef(pugi::xml_node n) const {
+        const char* name = prefixedRef_ ? n.name() : vorlan::jdf::localName(n);
+        return *name == refName_[0] && refName_ == name;
+    }
+    bool links(pugi::xml_node n, const char* usage) const {
+        return std::strcmp(n.attribute("rRef").value(), id_) == 0 && sameUsage(n.attribute("ProcessUsage").value(), usage);
+    }
+
+private:
+    const char* id_ = "";
+    std::string refName_;
+    bool prefixedRef_ = false;
+};
+
+// hasLinkWithUsage by a walk of the document.
+bool walkForLinkWithUsage(const JDF::JDFResource& resource, const char* usage) {
+    LinkMatch match(resource);
+    if (!match.possible()) return false;
     bool found = false;
     vorlan::jdf::forEachElementBelow(resource.GetDocRoot().node(), [&](pugi::xml_node n) {
         const char* local = vorlan::jdf::localName(n);
         // The pool's own children are looked at here; the walk goes on into them anyway.
         if (*local == 'R' && std::strcmp(local, "ResourceLinkPool") == 0) {
             for (pugi::xml_node link = n.first_child(); link && !found; link = link.next_sibling())
-                found = link.type() == pugi::node_element && refersHere(link);
+                found = link.type() == pugi::node_element && match.links(link, usage);
         }
-        const char* name = prefixedRef ? n.name() : local;
-        if (!found && *name == refName[0] && refName == name) found = refersHere(n);
+        if (!found && match.isRef(n)) found = match.links(n, usage);
         return !found;
     });
     return found;
 }
+
+}  // namespace
+
+bool vorlan::jdf::hasLinkWithUsage(const JDF::JDFResource& resource, const char* usage,
+                                   const std::vector<LinkCandidate>& candidates) {
+    LinkMatch match(resource);
+    if (!match.possible()) return false;
+    for (const LinkCandidate& c : candidates)
+        if ((c.inPool || match.isRef(c.node)) && match.links(c.node, usage)) return true;
+    return false;
+}
+
+namespace {
 
 bool isImposition(const JDF::JDFNode& node) {
     return vorlan::os::equalsIgnoreCase(node.GetType().c_str(), L"Imposition") ||
@@ -118,10 +198,10 @@ int LD_JDF::FindImpositionNode(JDF::JDFNode& root, JDF::JDFNode& out) {
     return 1;
 }
 
-bool LD_JDF::isProcessUsageMarks(const JDF::JDFResource& resource) { return hasLinkWithUsage(resource, "Marks"); }
+bool LD_JDF::isProcessUsageMarks(const JDF::JDFResource& resource) { return walkForLinkWithUsage(resource, "Marks"); }
 
 bool LD_JDF::isProcessUsageDocument(const JDF::JDFResource& resource) {
-    return hasLinkWithUsage(resource, "Document");
+    return walkForLinkWithUsage(resource, "Document");
 }
 
 LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
@@ -164,8 +244,11 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
             return LD_JDF_UNUSABLE;
         }
 
+        DocumentSurvey survey(t);
+        bool changed = false;  // the document since the survey
+
         // An automated layout is imposed elsewhere: the ticket goes on unchanged.
-        if (CheckForLayoutNodeAutomatedTrue(t.rootNode)) {
+        if (survey.automatedTrue && CheckForLayoutNodeAutomatedTrue(t.rootNode)) {
             if (outputJdfPath) doc.Write2File(JDF::WString(vorlan::os::widen(outputJdfPath)));
             return LD_JDF_UNUSABLE;
         }
@@ -187,6 +270,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
             if (t.layoutElement.isNull()) {
                 lastError = LD_JDF_RESOURCE_MISSING;
                 JDF::JDFLayout injected;
+                changed = true;
                 if (injectLayoutNode(t.rootNode, injected)) {
                     t.layoutElement = injected;
                     lastError = LD_OK;
@@ -194,6 +278,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
             }
         } else {
             JDF::JDFLayout injected;
+            changed = true;
             if (injectLayoutNode(t.rootNode, injected)) {
                 t.layoutElement = injected;
                 t.processNode = t.rootNode;
@@ -201,7 +286,11 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
             }
         }
 
-        findParameterResources(t);
+        if (survey.parametersFound && !changed) {
+            for (int k = 0; k < 3; ++k) *parameterSlot(t, k) = survey.parameters[k];
+        } else {
+            findParameterResources(t);
+        }
         for (const JDF::KElement* e : {&t.interpretingParamsElement, &t.renderingParamsElement,
                                        &t.digitalPrintingParamsElement})
             if (e->isNull()) lastError = LD_JDF_RESOURCE_MISSING;
@@ -219,6 +308,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
         if (resources.empty()) lastError = LD_JDF_RESOURCE_MISSING;
 
         vorlan::jdf::RunListReading runLists(*this);
+        if (!changed) runLists.linkCandidates = &survey.links;
         for (const JDF::KElement& element : resources) {
             JDF::JDFResource resource(element);
             if (resource.isNull() || !resource.IsResource(true) || resource.JDFElement::GetStatus() == 3) continue;

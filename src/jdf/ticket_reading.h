@@ -3,6 +3,7 @@
 
 #include <string>
 #include <unordered_map>
+#include <vector>
 
 #include "platform/jdf/jdf.h"
 #include "vorlan/LD_JDF.h"
@@ -23,10 +24,24 @@ private:
     std::unordered_map<std::wstring, int> first_;
 };
 
+// An element that may link a resource: a child of a ResourceLinkPool (inPool), or an element
+// whose name ends in "Ref".
+struct LinkCandidate {
+    pugi::xml_node node;
+    bool inPool;
+};
+
+// Whether one of the candidates links the resource with that ProcessUsage (ASCII, ignoring
+// case): the answer of LD_JDF::isProcessUsageMarks / isProcessUsageDocument, without a walk.
+bool hasLinkWithUsage(const JDF::JDFResource& resource, const char* usage, const std::vector<LinkCandidate>& candidates);
+
 struct RunListReading {
     LD_JDF& worker;
     PdfPositions contentPositions;
     PdfPositions markPositions;
+    // The document's link candidates while it is unchanged since they were gathered; when
+    // null, the worker is asked.
+    const std::vector<LinkCandidate>* linkCandidates = nullptr;
     explicit RunListReading(LD_JDF& w) : worker(w), contentPositions(w.contentPDFs), markPositions(w.markPDFs) {}
 };
 
