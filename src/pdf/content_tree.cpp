@@ -192,7 +192,7 @@ std::string pipedBytes(QPDFObjectHandle owner) {
     return std::string(reinterpret_cast<const char*>(data->getBuffer()), data->getSize());
 }
 
-std::shared_ptr<Content> build(QPDFObjectHandle owner, QPDFObjectHandle resources, bool isPage,
+std::shared_ptr<Content> build(QPDFObjectHandle owner, QPDFObjectHandle resources,
                                const GraphicsState& start, ColourSpaceResolver::SharedCache* cache,
                                std::set<QPDFObjGen>& openForms, int depth) {
     auto content = std::make_shared<Content>();
@@ -205,13 +205,13 @@ std::shared_ptr<Content> build(QPDFObjectHandle owner, QPDFObjectHandle resource
         return content;
     }
     TreeBuilder builder(*content, cache, start, openForms, depth);
-    content->complete = isPage ? builder.walkPage(owner) : builder.walkStream(owner);
+    content->complete = builder.walkBytes(content->bytes);
     builder.finish();
     return content;
 }
 
 std::shared_ptr<Content> TreeBuilder::parse(QPDFObjectHandle form, const GraphicsState& start) {
-    return build(form, streamResources(form, resources()), false, start, cache_, openForms_, depth_ + 1);
+    return build(form, streamResources(form, resources()), start, cache_, openForms_, depth_ + 1);
 }
 
 }  // namespace
@@ -244,13 +244,13 @@ std::shared_ptr<Content> parsePageContent(QPDFObjectHandle page, ColourSpaceReso
     } catch (const std::exception&) {
         resources = QPDFObjectHandle::newNull();
     }
-    return build(page, resources, true, GraphicsState::initial(), cache, openForms, 0);
+    return build(page, resources, GraphicsState::initial(), cache, openForms, 0);
 }
 
 std::shared_ptr<Content> parseFormContent(QPDFObjectHandle form, QPDFObjectHandle parentResources,
                                           const GraphicsState& start, ColourSpaceResolver::SharedCache* cache) {
     std::set<QPDFObjGen> openForms{form.getObjGen()};
-    return build(form, streamResources(form, parentResources), false, start, cache, openForms, 0);
+    return build(form, streamResources(form, parentResources), start, cache, openForms, 0);
 }
 
 }  // namespace vorlan::pdf

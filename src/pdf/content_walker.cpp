@@ -1,7 +1,12 @@
 // Content walking: operand gathering, graphics-state tracking and step classification.
 #include "pdf/content_walker.h"
 
+#include <qpdf/Buffer.hh>
+#include <qpdf/Pl_Buffer.hh>
 #include <qpdf/QPDFPageObjectHelper.hh>
+
+#include <cstdlib>
+#include <memory>
 
 #include <exception>
 
@@ -37,11 +42,6 @@ QPDFObjectHandle resourceEntry(QPDFObjectHandle resources, const char* category,
     return dict.isDictionary() ? dict.getKey(name) : QPDFObjectHandle::newNull();
 }
 
-std::string lastName(std::vector<QPDFObjectHandle>& operands) {
-    if (operands.empty() || !operands.back().isName()) return {};
-    return operands.back().getName();
-}
-
 }  // namespace
 
 GraphicsState GraphicsState::initial() {
@@ -64,38 +64,98 @@ ContentWalker::ContentWalker(QPDFObjectHandle resources, ColourSpaceResolver::Sh
     operands_.reserve(16);
 }
 
-bool ContentWalker::walkPage(QPDFObjectHandle page) { return runParser(page, true); }
-
-bool ContentWalker::walkStream(QPDFObjectHandle stream) { return runParser(stream, false); }
-
-bool ContentWalker::runParser(QPDFObjectHandle owner, bool isPage) {
+bool ContentWalker::walkPage(QPDFObjectHandle page) {
+    std::string bytes;
     try {
-        if (isPage) {
-            QPDFPageObjectHelper(owner).parseContents(this);
-        } else {
-            if (!owner.isStream()) return false;
-            owner.parseAsContents(this);
-        }
-        return true;
+        Pl_Buffer buffer("content");
+        QPDFPageObjectHelper(page).pipeContents(&buffer);
+        std::unique_ptr<Buffer> data(buffer.getBuffer());
+        bytes.assign(reinterpret_cast<const char*>(data->getBuffer()), data->getSize());
     } catch (const std::exception&) {
         return false;
     }
+    return walkBytes(bytes);
 }
 
-void ContentWalker::handleEOF() {}
+bool ContentWalker::walkStream(QPDFObjectHandle stream) {
+    std::string bytes;
+    try {
+        if (!stream.isStream()) return false;
+        Pl_Buffer buffer("content");
+        if (!stream.pipeStreamData(&buffer, 0, qpdf_dl_generalized)) return false;
+        std::unique_ptr<Buffer> data(buffer.getBuffer());
+        bytes.assign(reinterpret_cast<const char*>(data->getBuffer()), data->getSize());
+    } catch (const std::exception&) {
+        return false;
+    }
+    return walkBytes(bytes);
+}
 
-void ContentWalker::handleObject(QPDFObjectHandle object, size_t offset, size_t length) {
-    if (object.isOperator()) {
-        handleOperator(object.getOperatorValue(), offset, length);
+bool ContentWalker::walkBytes(const std::string& bytes) {
+    bytes_ = &bytes;
+    ContentLexer lexer(bytes);
+    int depth = 0;          // inside an array or dictionary operand
+    size_t compositeBegin = 0;
+    bool complete = true;
+    for (;;) {
+        const ContentToken t = lexer.next();
+        if (t.kind == ContentToken::End) break;
+        if (t.kind == ContentToken::Damaged) {
+            complete = false;
+            break;
+        }
+        if (t.kind == ContentToken::Open) {
+            if (depth++ == 0) compositeBegin = t.begin;
+            continue;
+        }
+        if (t.kind == ContentToken::Close) {
+            if (depth > 0 && --depth == 0) {
+                if (!haveOperands_) {
+                    operandStart_ = compositeBegin;
+                    haveOperands_ = true;
+                }
+                operands_.push_back({ContentToken::Open, compositeBegin, t.end});
+            }
+            continue;
+        }
+        if (depth > 0) continue;
+        const size_t length = t.end - t.begin;
+        const bool keyword = t.kind == ContentToken::Keyword &&
+                             !(length == 4 && (!bytes.compare(t.begin, 4, "true") || !bytes.compare(t.begin, 4, "null"))) &&
+                             !(length == 5 && !bytes.compare(t.begin, 5, "false"));
+        if (!keyword) {
+            if (!haveOperands_) {
+                operandStart_ = t.begin;
+                haveOperands_ = true;
+            }
+            operands_.push_back(t);
+            continue;
+        }
+        const std::string op = bytes.substr(t.begin, length);
+        handleOperator(op, t.begin, length);
         operands_.clear();
         haveOperands_ = false;
-        return;
+        if (op == "ID" && !lexer.skipInlineImageData(t.end)) {
+            complete = false;
+            break;
+        }
     }
-    if (!haveOperands_) {
-        operandStart_ = offset;
-        haveOperands_ = true;
+    bytes_ = nullptr;
+    return complete;
+}
+
+std::string ContentWalker::lastName() const {
+    if (operands_.empty() || operands_.back().kind != ContentToken::Name) return {};
+    return decodeName(*bytes_, operands_.back().begin, operands_.back().end);
+}
+
+QPDFObjectHandle ContentWalker::parseOperand(const ContentToken& token) const {
+    try {
+        if (token.kind == ContentToken::Name) return QPDFObjectHandle::newName(decodeName(*bytes_, token.begin, token.end));
+        return QPDFObjectHandle::parse(bytes_->substr(token.begin, token.end - token.begin));
+    } catch (const std::exception&) {
+        return QPDFObjectHandle::newNull();
     }
-    operands_.push_back(std::move(object));
 }
 
 void ContentWalker::setColourSpace(bool stroke, ColourSpaceRef space) {
@@ -134,7 +194,7 @@ void ContentWalker::handleOperator(const std::string& op, size_t offset, size_t 
         case 'c':
         case 'C':
             if (op == "cs" || op == "CS") {
-                std::string name = lastName(operands_);
+                std::string name = lastName();
                 setColourSpace(c0 == 'C', name.empty() ? deviceColourSpace("/DeviceGray")
                                                        : spaces_.byName(name));
             } else if (isPathPart(op)) {
@@ -146,10 +206,10 @@ void ContentWalker::handleOperator(const std::string& op, size_t offset, size_t 
             if (op == "sc" || op == "SC" || op == "scn" || op == "SCN") {
                 const bool stroke = c0 == 'S';
                 (stroke ? state_.strokeSet : state_.fillSet) = true;
-                (stroke ? state_.strokePattern : state_.fillPattern) = lastName(operands_);
+                (stroke ? state_.strokePattern : state_.fillPattern) = lastName();
             } else if (op == "sh") {
                 step.kind = StepKind::Shading;
-                step.name = lastName(operands_);
+                step.name = lastName();
                 step.object = resourceEntry(resources_, "/Shading", step.name);
                 QPDFObjectHandle dict = step.object.isStream() ? step.object.getDict() : step.object;
                 if (dict.isDictionary()) step.ownSpace = spaces_.byObject(dict.getKey("/ColorSpace"));
@@ -170,8 +230,10 @@ void ContentWalker::handleOperator(const std::string& op, size_t offset, size_t 
         case 'T':
             if (op == "Tr") {
                 int mode = 0;
-                if (!operands_.empty() && operands_.back().getValueAsInt(mode) && mode >= 0 && mode <= 7)
-                    state_.textRender = mode;
+                if (!operands_.empty() && operands_.back().kind == ContentToken::Number) {
+                    mode = std::atoi(bytes_->c_str() + operands_.back().begin);
+                    if (mode >= 0 && mode <= 7) state_.textRender = mode;
+                }
             } else if (op == "Tj" || op == "TJ") {
                 step.kind = StepKind::TextShow;
             }
@@ -199,7 +261,9 @@ void ContentWalker::handleOperator(const std::string& op, size_t offset, size_t 
             if (op == "ID") {  // the operands are the image dictionary's keys and values
                 inlineDict_ = QPDFObjectHandle::newDictionary();
                 for (size_t i = 0; i + 1 < operands_.size(); i += 2)
-                    if (operands_[i].isName()) inlineDict_.replaceKey(operands_[i].getName(), operands_[i + 1]);
+                    if (operands_[i].kind == ContentToken::Name)
+                        inlineDict_.replaceKey(decodeName(*bytes_, operands_[i].begin, operands_[i].end),
+                                               parseOperand(operands_[i + 1]));
                 step.kind = StepKind::Other;
             }
             break;
@@ -237,7 +301,7 @@ void ContentWalker::handleOperator(const std::string& op, size_t offset, size_t 
 }
 
 void ContentWalker::fillXObjectStep(Step& step) {
-    step.name = lastName(operands_);
+    step.name = lastName();
     QPDFObjectHandle xobject = resourceEntry(resources_, "/XObject", step.name);
     if (!xobject.isStream()) return;  // a missing XObject paints nothing
     QPDFObjectHandle dict = xobject.getDict();
@@ -271,10 +335,10 @@ void ContentWalker::fillInlineImageStep(Step& step) {
 }
 
 void ContentWalker::fillMarkedStep(Step& step) {
-    if (operands_.empty() || !operands_.front().isName()) return;
-    step.name = operands_.front().getName();
+    if (operands_.empty() || operands_.front().kind != ContentToken::Name) return;
+    step.name = decodeName(*bytes_, operands_.front().begin, operands_.front().end);
     if (operands_.size() >= 2) {
-        QPDFObjectHandle props = operands_[1];
+        QPDFObjectHandle props = parseOperand(operands_[1]);
         if (props.isName()) props = resourceEntry(resources_, "/Properties", props.getName());
         step.object = props;
     }

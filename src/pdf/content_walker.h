@@ -1,7 +1,7 @@
 // A single pass over page or form content: operators with their byte ranges, the graphics state
 // at each of them, and what each painting operator paints with.
 //
-// qpdf parses the content (QPDFObjectHandle::ParserCallbacks); this class gathers operands,
+// The content lexer splits the decoded content into tokens; this class gathers operands,
 // follows q/Q and the colour operators, resolves colour spaces and XObjects through the
 // content's resources, and hands one Step per operator to handleStep(). Users derive from it:
 // the element tree (content_tree.h) and the page ink scan (page_inks.h).
@@ -14,6 +14,7 @@
 #include <vector>
 
 #include "pdf/colour_space.h"
+#include "pdf/content_lexer.h"
 
 namespace vorlan::pdf {
 
@@ -56,7 +57,7 @@ struct Step {
     size_t begin = 0;    // first byte of the first operand (of BI for inline images)
     size_t opBegin = 0;  // first byte of the operator
     size_t end = 0;      // one past the operator
-    const std::vector<QPDFObjectHandle>* operands = nullptr;
+    const std::vector<ContentToken>* operands = nullptr;  // byte ranges in the walked content
     bool fills = false;      // paints with the fill colour (paths, text, image masks)
     bool strokes = false;    // paints with the stroke colour
     ColourSpaceRef ownSpace; // images, inline images and shadings: their own colour space
@@ -66,7 +67,7 @@ struct Step {
     bool optionalContent = false;  // BDC /OC, or an XObject with its own /OC entry
 };
 
-class ContentWalker : public QPDFObjectHandle::ParserCallbacks {
+class ContentWalker {
 public:
     // resources: the content's /Resources; cache: document-wide colour-space cache (may be null).
     ContentWalker(QPDFObjectHandle resources, ColourSpaceResolver::SharedCache* cache,
@@ -77,16 +78,17 @@ public:
     // to the damage have been handled.
     bool walkPage(QPDFObjectHandle page);
     bool walkStream(QPDFObjectHandle stream);
+    // Walks decoded content bytes (which must outlive the walk); offsets point into them.
+    bool walkBytes(const std::string& bytes);
 
     const GraphicsState& state() const { return state_; }
     ColourSpaceResolver& colourSpaces() { return spaces_; }
     QPDFObjectHandle resources() const { return resources_; }
 
+    virtual ~ContentWalker() = default;
+
 protected:
     virtual void handleStep(const Step& step) = 0;
-
-    void handleObject(QPDFObjectHandle object, size_t offset, size_t length) override;
-    void handleEOF() override;
 
 private:
     void handleOperator(const std::string& op, size_t offset, size_t length);
@@ -94,13 +96,15 @@ private:
     void fillXObjectStep(Step& step);
     void fillInlineImageStep(Step& step);
     void fillMarkedStep(Step& step);
-    bool runParser(QPDFObjectHandle contentOwner, bool isPage);
+    std::string lastName() const;
+    QPDFObjectHandle parseOperand(const ContentToken& token) const;
 
     QPDFObjectHandle resources_;
     ColourSpaceResolver spaces_;
     GraphicsState state_;
     std::vector<GraphicsState> saved_;
-    std::vector<QPDFObjectHandle> operands_;
+    const std::string* bytes_ = nullptr;
+    std::vector<ContentToken> operands_;
     size_t operandStart_ = 0;
     bool haveOperands_ = false;
     size_t inlineBegin_ = 0;

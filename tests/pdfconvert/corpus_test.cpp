@@ -111,8 +111,9 @@ TEST(CorpusRewrite, SpotColourFilesDropAndKeepTheirFirstSpot) {
         for (auto& [name, pixels] : kept) {
             EXPECT_EQ(name, spot) << "only the kept spot prints";
         }
+        original.erase(spot);
         for (auto& [name, pixels] : original) {
-            if (name != spot) EXPECT_NEAR(dropped[name], pixels, pixels / 50 + 2) << name;
+            EXPECT_NEAR(dropped[name], pixels, pixels / 50 + 2) << name;
         }
     }
 }

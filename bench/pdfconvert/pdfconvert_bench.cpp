@@ -1,0 +1,197 @@
+// Conversion for versions and separation rewriting of a large generated PDF, each against
+// `qpdf --linearize --recompress-flate` of the same file, side by side in one run. Every
+// operation runs in a child process, so its time and peak memory are its own.
+//
+//   pdfconvert_bench [--pages N] [--elements N] [--runs N] [--keep]
+// Targets: time <= 1.0x and peak memory <= 2.0x those of qpdf.
+#include <qpdf/QPDF.hh>
+#include <qpdf/QPDFPageDocumentHelper.hh>
+#include <qpdf/QPDFWriter.hh>
+
+#include <sys/resource.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <filesystem>
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "pdf/separation_layers.h"
+#include "pdf/separation_rewrite.h"
+
+namespace fs = std::filesystem;
+using Clock = std::chrono::steady_clock;
+
+namespace {
+
+std::string ref(QPDFObjectHandle o) { return std::to_string(o.getObjectID()) + " 0 R"; }
+
+// About a third of the elements paint in spot colours (Separation fills and strokes, DeviceN
+// fills, uses of a shared spot form); the rest in process colours (fills, strokes, text, uses of
+// a shared process form, an image).
+std::string pageContent(int page, int elements) {
+    std::string c;
+    char line[160];
+    for (int i = 0; i < elements; ++i) {
+        const double x = (i * 7 + page) % 500, y = (i * 13) % 700;
+        switch (i % 9) {
+            case 0: std::snprintf(line, sizeof line, "/Gold cs 0.%d scn %.1f %.1f 20 10 re f\n", i % 10, x, y); break;
+            case 3: std::snprintf(line, sizeof line, "/Silver CS 1 SCN 1 w %.1f %.1f m %.1f %.1f l S\n", x, y, x + 30, y + 5); break;
+            case 6:
+                if (i % 2) std::snprintf(line, sizeof line, "q 1 0 0 1 %.1f %.1f cm /SpotForm Do Q\n", x, y);
+                else std::snprintf(line, sizeof line, "/Both cs 0.3 0.7 scn %.1f %.1f 15 15 re f\n", x, y);
+                break;
+            case 1: std::snprintf(line, sizeof line, "0.1 0.2 0.3 0.4 k %.1f %.1f 12 12 re f\n", x, y); break;
+            case 2: std::snprintf(line, sizeof line, "BT /F1 9 Tf 0 g %.1f %.1f Td (Item %d) Tj ET\n", x, y, i); break;
+            case 4: std::snprintf(line, sizeof line, "q 1 0 0 1 %.1f %.1f cm /ProcessForm Do Q\n", x, y); break;
+            case 5: std::snprintf(line, sizeof line, "0.5 G %.1f %.1f m %.1f %.1f %.1f %.1f %.1f %.1f c S\n", x, y, x + 5, y + 9, x + 12, y + 3, x + 20, y); break;
+            case 7: std::snprintf(line, sizeof line, "q 20 0 0 20 %.1f %.1f cm /Im0 Do Q\n", x, y); break;
+            default: std::snprintf(line, sizeof line, "0.2 0.4 0.6 rg %.1f %.1f 8 8 re f\n", x, y); break;
+        }
+        c += line;
+    }
+    return c;
+}
+
+void generate(const fs::path& file, int pages, int elements) {
+    QPDF pdf;
+    pdf.emptyPDF();
+    auto tint = [&](const char* c1) {
+        return ref(pdf.makeIndirectObject(QPDFObjectHandle::parse(
+            std::string("<< /FunctionType 2 /Domain [0 1] /C0 [0 0 0 0] /C1 ") + c1 + " /N 1 >>")));
+    };
+    QPDFObjectHandle sum = QPDFObjectHandle::newStream(&pdf, "{ add 0 0 0 4 -1 roll dup 1 gt {pop 1} if }");
+    sum.getDict().replaceKey("/FunctionType", QPDFObjectHandle::newInteger(4));
+    sum.getDict().replaceKey("/Domain", QPDFObjectHandle::parse("[0 1 0 1]"));
+    sum.getDict().replaceKey("/Range", QPDFObjectHandle::parse("[0 1 0 1 0 1 0 1]"));
+    QPDFObjectHandle spaces = pdf.makeIndirectObject(QPDFObjectHandle::parse(
+        &pdf, "<< /Gold [/Separation /Gold /DeviceCMYK " + tint("[0 0.2 0.8 0]") + "] /Silver [/Separation /Silver "
+              "/DeviceCMYK " + tint("[0 0 0 0.3]") + "] /Both [/DeviceN [/Gold /Silver] /DeviceCMYK " + ref(sum) + "] >>"));
+    auto form = [&](const std::string& content) {
+        QPDFObjectHandle f = QPDFObjectHandle::newStream(&pdf, content);
+        f.getDict().replaceKey("/Type", QPDFObjectHandle::newName("/XObject"));
+        f.getDict().replaceKey("/Subtype", QPDFObjectHandle::newName("/Form"));
+        f.getDict().replaceKey("/BBox", QPDFObjectHandle::parse("[0 0 10 10]"));
+        f.getDict().replaceKey("/Resources", QPDFObjectHandle::parse(&pdf, "<< /ColorSpace " + ref(spaces) + " >>"));
+        return f;
+    };
+    QPDFObjectHandle spotForm = form("/Gold cs 1 scn 0 0 10 10 re f /Silver cs 1 scn 2 2 5 5 re f");
+    QPDFObjectHandle processForm = form("0 0 1 0 k 0 0 10 10 re f 0 g 2 2 5 5 re f");
+    QPDFObjectHandle image = QPDFObjectHandle::newStream(&pdf, std::string(256, '\x40'));
+    image.getDict().replaceKey("/Type", QPDFObjectHandle::newName("/XObject"));
+    image.getDict().replaceKey("/Subtype", QPDFObjectHandle::newName("/Image"));
+    image.getDict().replaceKey("/Width", QPDFObjectHandle::newInteger(8));
+    image.getDict().replaceKey("/Height", QPDFObjectHandle::newInteger(8));
+    image.getDict().replaceKey("/BitsPerComponent", QPDFObjectHandle::newInteger(8));
+    image.getDict().replaceKey("/ColorSpace", QPDFObjectHandle::newName("/DeviceCMYK"));
+    QPDFObjectHandle resources = pdf.makeIndirectObject(QPDFObjectHandle::parse(
+        &pdf, "<< /ColorSpace " + ref(spaces) + " /XObject << /Im0 " + ref(image) + " /SpotForm " + ref(spotForm) +
+                  " /ProcessForm " + ref(processForm) +
+                  " >> /Font << /F1 << /Type /Font /Subtype /Type1 /BaseFont /Helvetica >> >> >>"));
+    QPDFPageDocumentHelper helper(pdf);
+    for (int p = 0; p < pages; ++p) {
+        QPDFObjectHandle page = pdf.makeIndirectObject(QPDFObjectHandle::parse(
+            &pdf, "<< /Type /Page /MediaBox [0 0 595 842] /Resources " + ref(resources) + " >>"));
+        page.replaceKey("/Contents", QPDFObjectHandle::newStream(&pdf, pageContent(p, elements)));
+        helper.addPage(page, false);
+    }
+    QPDFWriter writer(pdf, file.c_str());
+    writer.setStaticID(true);
+    writer.setCompressStreams(true);
+    writer.setObjectStreamMode(qpdf_o_generate);
+    writer.write();
+}
+
+struct Measure {
+    double seconds = 0;
+    long peakKb = 0;
+    int status = 0;
+};
+
+// Runs `work` in a child process: wall time, peak resident memory and exit status.
+Measure inChild(const std::function<int()>& work) {
+    Measure m;
+    const auto start = Clock::now();
+    const pid_t pid = fork();
+    if (pid == 0) _exit(work());
+    int status = 0;
+    rusage usage{};
+    wait4(pid, &status, 0, &usage);
+    m.seconds = std::chrono::duration<double>(Clock::now() - start).count();
+    m.peakKb = usage.ru_maxrss;
+    m.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    return m;
+}
+
+Measure qpdfLinearize(const fs::path& in, const fs::path& out) {
+    return inChild([&] {
+        execlp("qpdf", "qpdf", "--linearize", "--recompress-flate", in.c_str(), out.c_str(), static_cast<char*>(nullptr));
+        return 127;
+    });
+}
+
+double median(std::vector<double> v) {
+    std::sort(v.begin(), v.end());
+    return v[v.size() / 2];
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+    int pages = 500, elements = 200, runs = 3;
+    bool keep = false;
+    for (int i = 1; i < argc; ++i) {
+        auto next = [&] { return i + 1 < argc ? std::atoi(argv[++i]) : 0; };
+        if (!std::strcmp(argv[i], "--pages")) pages = next();
+        else if (!std::strcmp(argv[i], "--elements")) elements = next();
+        else if (!std::strcmp(argv[i], "--runs")) runs = std::max(1, next());
+        else if (!std::strcmp(argv[i], "--keep")) keep = true;
+        else {
+            std::fprintf(stderr, "usage: pdfconvert_bench [--pages N] [--elements N] [--runs N] [--keep]\n");
+            return 2;
+        }
+    }
+    const fs::path dir = fs::temp_directory_path() / ("vorlan-convert-bench-" + std::to_string(getpid()));
+    fs::create_directories(dir);
+    const fs::path in = dir / "in.pdf";
+    generate(in, pages, elements);
+    std::printf("generated %s: %d pages x %d elements, %.1f MB\n", in.c_str(), pages, elements,
+                static_cast<double>(fs::file_size(in)) / 1e6);
+
+    const char* seps[] = {"Gold", "Silver"};
+    const std::vector<std::string> keepList = {"Gold"};
+    std::vector<double> tq, tc, tr, mq, mc, mr;
+    qpdfLinearize(in, dir / "warm.pdf");  // file cache
+    for (int r = 0; r < runs; ++r) {  // interleaved, so all see the same machine load
+        Measure q = qpdfLinearize(in, dir / "qpdf.pdf");
+        Measure c = inChild([&] {
+            return vorlan::pdf::convertPDF(nullptr, in.c_str(), (dir / "converted.pdf").c_str(), seps, nullptr, 2, 0);
+        });
+        Measure w = inChild([&] {
+            return vorlan::pdf::rewriteSeparations(nullptr, in.c_str(), (dir / "rewritten.pdf").c_str(), keepList, true);
+        });
+        if (q.status || c.status || w.status)
+            std::fprintf(stderr, "a run failed: qpdf %d, conversion %d, rewriting %d\n", q.status, c.status, w.status);
+        tq.push_back(q.seconds), tc.push_back(c.seconds), tr.push_back(w.seconds);
+        mq.push_back(static_cast<double>(q.peakKb)), mc.push_back(static_cast<double>(c.peakKb)),
+            mr.push_back(static_cast<double>(w.peakKb));
+    }
+    const double q = median(tq), c = median(tc), w = median(tr);
+    const double qm = median(mq), cm = median(mc), wm = median(mr);
+    std::printf("%-44s %10s %12s\n", "", "median s", "peak MB");
+    std::printf("%-44s %10.3f %12.1f\n", "qpdf --linearize --recompress-flate", q, qm / 1024);
+    std::printf("%-44s %10.3f %12.1f\n", "conversion (Gold, Silver into groups)", c, cm / 1024);
+    std::printf("%-44s %10.3f %12.1f\n", "rewriting (keep-listed Gold)", w, wm / 1024);
+    const bool ok = c / q <= 1.0 && w / q <= 1.0 && cm / qm <= 2.0 && wm / qm <= 2.0;
+    std::printf("conversion: time %.2fx, memory %.2fx; rewriting: time %.2fx, memory %.2fx "
+                "(targets <= 1.00x, <= 2.00x) %s\n",
+                c / q, cm / qm, w / q, wm / qm, ok ? "ok" : "OVER");
+    if (!keep) fs::remove_all(dir);
+    return ok ? 0 : 1;
+}
