@@ -35,13 +35,14 @@ wchar_t* copyText(const JDF::WString& text) {
 
 // Exact-size wide copy of UTF-8 text.
 wchar_t* copyText(const char* text) {
-    size_t length = 0;
-    bool ascii = true;
-    for (; text[length]; ++length) ascii = ascii && static_cast<unsigned char>(text[length]) < 0x80;
-    if (!ascii) return copyText(JDF::WString(text));
+    size_t length = std::strlen(text);
+    unsigned char bits = 0;
+    for (size_t i = 0; i < length; ++i) bits |= static_cast<unsigned char>(text[i]);
+    if (bits >= 0x80) return copyText(JDF::WString(text));
     auto* copy = static_cast<wchar_t*>(std::malloc((length + 1) * sizeof(wchar_t)));
     if (!copy) throw OutOfText{};
-    for (size_t i = 0; i <= length; ++i) copy[i] = static_cast<wchar_t>(static_cast<unsigned char>(text[i]));
+    for (size_t i = 0; i < length; ++i) copy[i] = static_cast<wchar_t>(static_cast<unsigned char>(text[i]));
+    copy[length] = L'\0';
     return copy;
 }
 
@@ -55,7 +56,7 @@ bool isAscii(const char* text) {
 // names beyond ASCII are compared in wide form.
 bool namedNode(pugi::xml_node n, const char* name) {
     const char* local = localName(n);
-    if (vorlan::os::equalsIgnoreCaseAscii(local, name)) return true;
+    if (std::strcmp(local, name) == 0 || vorlan::os::equalsIgnoreCaseAscii(local, name)) return true;
     if (isAscii(local)) return false;
     return vorlan::os::equalsIgnoreCase(JDF::WString(local).c_str(), JDF::WString(name).c_str());
 }
@@ -129,22 +130,28 @@ struct PlacedAttributes {
     static const char* text(const char* value) { return value ? value : ""; }
 
 private:
+    // Names are short: compared inline rather than through strcmp.
+    static bool same(const char* a, const char* b) {
+        for (; *a && *a == *b; ++a, ++b) {}
+        return *a == *b;
+    }
+
     const char** slotOf(const char* name) {
         switch (name[0]) {
             case 'C':
-                if (std::strcmp(name, "CTM") == 0) return &ctm;
-                if (std::strcmp(name, "ClipBox") == 0) return &clipBox;
-                if (std::strcmp(name, "ClipPath") == 0) return &clipPath;
+                if (same(name, "CTM")) return &ctm;
+                if (same(name, "ClipBox")) return &clipBox;
+                if (same(name, "ClipPath")) return &clipPath;
                 return nullptr;
-            case 'O': return std::strcmp(name, "Ord") == 0 ? &ord : nullptr;
-            case 'S': return std::strcmp(name, "SourceClipPath") == 0 ? &sourceClipPath : nullptr;
+            case 'O': return same(name, "Ord") ? &ord : nullptr;
+            case 'S': return same(name, "SourceClipPath") ? &sourceClipPath : nullptr;
             case 'T':
-                if (std::strcmp(name, "TrimSize") == 0) return &trimSize;
-                if (std::strcmp(name, "TrimCTM") == 0) return &trimCtm;
+                if (same(name, "TrimSize")) return &trimSize;
+                if (same(name, "TrimCTM")) return &trimCtm;
                 return nullptr;
             case 'A':
-                if (std::strcmp(name, "ADBE:CachePlacedObject") == 0) return &cachePlacedObject;
-                if (std::strcmp(name, "ADBE:IgnoreClipForReuse") == 0) return &ignoreClipForReuse;
+                if (same(name, "ADBE:CachePlacedObject")) return &cachePlacedObject;
+                if (same(name, "ADBE:IgnoreClipForReuse")) return &ignoreClipForReuse;
                 return nullptr;
             default: return nullptr;
         }

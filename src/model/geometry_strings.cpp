@@ -3,6 +3,7 @@
 
 #include <cctype>
 #include <charconv>
+#include <cstddef>
 #include <cstdint>
 #include <cstring>
 #include <string>
@@ -51,6 +52,54 @@ double readNumber(std::string_view token) {
         !readPlainDecimal(token.data() + i, token.data() + token.size(), value))
         std::from_chars(token.data() + i, token.data() + token.size(), value);
     return negative ? -value : value;
+}
+
+// A token that is a plain decimal with an optional sign ("-12.5"), read in one pass up to its
+// end (a space or the end of the text): the value readNumber gives, by the same exact rule as
+// readPlainDecimal. False, with nothing read, for any other token.
+bool readPlainToken(const char*& p, const char* end, double& value) {
+    static constexpr double kPowers[] = {1e0, 1e1, 1e2, 1e3, 1e4, 1e5, 1e6, 1e7, 1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+    const char* q = p;
+    bool negative = false;
+    if (q < end && (*q == '+' || *q == '-')) negative = *q++ == '-';
+    uint64_t mantissa = 0;  // wraps harmlessly for long numbers, which are refused below
+    const char* first = q;
+    for (; q < end && isDigit(*q); ++q) mantissa = mantissa * 10 + static_cast<uint64_t>(*q - '0');
+    std::ptrdiff_t digits = q - first, fraction = 0;
+    if (q < end && *q == '.') {
+        const char* point = ++q;
+        for (; q < end && isDigit(*q); ++q) mantissa = mantissa * 10 + static_cast<uint64_t>(*q - '0');
+        fraction = q - point;
+        digits += fraction;
+    }
+    if ((q < end && *q != ' ') || digits == 0 || digits > 15) return false;
+    value = static_cast<double>(mantissa);
+    if (fraction > 0) value /= kPowers[fraction];
+    if (negative) value = -value;
+    p = q;
+    return true;
+}
+
+// Calls fn(number) for the number of each token of the text (tokens split at single space
+// characters only, as forEachToken has them, each read by readNumber) while fn returns true.
+template <typename Fn>
+void forEachNumber(std::string_view text, Fn fn) {
+    const char* p = text.data();
+    const char* end = p + text.size();
+    while (p < end) {
+        if (*p == ' ') {
+            ++p;
+            continue;
+        }
+        double value = 0;
+        if (!readPlainToken(p, end, value)) {
+            auto* space = static_cast<const char*>(std::memchr(p, ' ', static_cast<size_t>(end - p)));
+            const char* tokenEnd = space ? space : end;
+            value = readNumber(std::string_view(p, static_cast<size_t>(tokenEnd - p)));
+            p = tokenEnd;
+        }
+        if (!fn(value)) return;
+    }
 }
 
 // Calls fn for each token of the narrowed text, split at single space characters only.
@@ -136,32 +185,28 @@ namespace vorlan::geometry {
 void parsePoints(std::string_view text, std::vector<LD_Point*>& points) {
     double x = 0;
     bool haveX = false;
-    forEachToken(text, [&](std::string_view token) {
-        double value = readNumber(token);
+    forEachNumber(text, [&](double value) {
         if (!haveX) {
             x = value;
             haveX = true;
-            return;
+            return true;
         }
         auto* point = new LD_Point;
         point->x = x;
         point->y = value;
         points.push_back(point);
         haveX = false;
+        return true;
     });
 }
 
 bool parseFirstPoint(std::string_view text, LD_Point& point) {
     double numbers[2] = {};
     size_t count = 0;
-    // Only the first two tokens are read; the walk stops at the third.
-    while (!text.empty() && count < 2) {
-        size_t space = text.find(' ');
-        std::string_view token = text.substr(0, space);
-        if (!token.empty()) numbers[count++] = readNumber(token);
-        if (space == std::string_view::npos) break;
-        text.remove_prefix(space + 1);
-    }
+    forEachNumber(text, [&](double value) {
+        numbers[count++] = value;
+        return count < 2;  // later tokens do not count
+    });
     if (count < 2) return false;
     point.x = numbers[0];
     point.y = numbers[1];
@@ -172,7 +217,10 @@ void parseBox(std::string_view text, LD_Box* box) {
     // Numbers after the fourth cycle through the fields again: the last one of each cycle stays.
     double fields[4] = {};
     size_t count = 0;
-    forEachToken(text, [&](std::string_view token) { fields[count++ % 4] = readNumber(token); });
+    forEachNumber(text, [&](double value) {
+        fields[count++ % 4] = value;
+        return true;
+    });
     if (!box || count < 4) return;
     box->lowerLeft.x = fields[0];
     box->lowerLeft.y = fields[1];
@@ -183,9 +231,9 @@ void parseBox(std::string_view text, LD_Box* box) {
 void parseCTM(std::string_view text, LD_CTM* ctm) {
     double n[6] = {};
     size_t count = 0;
-    forEachToken(text, [&](std::string_view token) {
-        if (count < 6) n[count] = readNumber(token);
-        ++count;
+    forEachNumber(text, [&](double value) {
+        n[count++] = value;
+        return count < 6;  // six numbers make the matrix; more are not read
     });
     if (!ctm || count < 6) return;
     ctm->a = n[0], ctm->b = n[1], ctm->c = n[2], ctm->d = n[3], ctm->e = n[4], ctm->f = n[5];
