@@ -66,6 +66,20 @@ ColourSpaceRef ColourSpaceResolver::byName(const std::string& name) {
         if (ColourSpaceRef device = deviceColourSpace(name)) return device;
     auto it = byName_.find(name);
     if (it != byName_.end()) return it->second;
+    // The dictionary that gives the name its meaning, when it is shared across contents.
+    QPDFObjGen owner;
+    if (shared_ && resources_.isDictionary()) {
+        QPDFObjectHandle spaces = resources_.getKey("/ColorSpace");
+        if (spaces.isIndirect()) owner = spaces.getObjGen();
+        else if (resources_.isIndirect()) owner = resources_.getObjGen();
+    }
+    if (owner.isIndirect()) {
+        auto known = shared_->names.find({owner, name});
+        if (known != shared_->names.end()) {
+            byName_.emplace(name, known->second);
+            return known->second;
+        }
+    }
     ColourSpaceRef cs;
     try {
         // /G, /RGB and /CMYK are resource names like any other; only where no such resource
@@ -76,6 +90,7 @@ ColourSpaceRef ColourSpaceResolver::byName(const std::string& name) {
         cs = unknownSpace();
     }
     byName_.emplace(name, cs);
+    if (owner.isIndirect()) shared_->names.emplace(std::make_pair(owner, name), cs);
     return cs;
 }
 
@@ -105,11 +120,11 @@ ColourSpaceRef ColourSpaceResolver::resolve(QPDFObjectHandle object, int depth) 
     if (!object.isArray()) return unknownSpace();
     const bool indirect = object.isIndirect();
     if (indirect && shared_) {
-        auto it = shared_->find(object.getObjGen());
-        if (it != shared_->end()) return it->second;
+        auto it = shared_->objects.find(object.getObjGen());
+        if (it != shared_->objects.end()) return it->second;
     }
     ColourSpaceRef cs = resolveArray(object, depth);
-    if (indirect && shared_) shared_->emplace(object.getObjGen(), cs);
+    if (indirect && shared_) shared_->objects.emplace(object.getObjGen(), cs);
     return cs;
 }
 

@@ -44,7 +44,12 @@ ColourSpaceRef deviceColourSpace(const std::string& name);
 // a space of family Unknown with no inks.
 class ColourSpaceResolver {
 public:
-    using SharedCache = std::map<QPDFObjGen, ColourSpaceRef>;
+    // Document-wide: indirect colour-space objects, and names of indirect resource dictionaries
+    // (shared by many pages), resolved once.
+    struct SharedCache {
+        std::map<QPDFObjGen, ColourSpaceRef> objects;
+        std::map<std::pair<QPDFObjGen, std::string>, ColourSpaceRef> names;
+    };
 
     ColourSpaceResolver(QPDFObjectHandle resources, SharedCache* shared)
         : resources_(std::move(resources)), shared_(shared) {}

@@ -130,11 +130,10 @@ std::string ContentEditor::resourceName(const char* category, QPDFObjectHandle o
     if (known != names_.end()) return known->second;
     QPDFObjectHandle resources = ownResources();
     QPDFObjectHandle dict = resources.getKey(category);
+    // A dictionary shared with other contents gains the key as well: adding a name changes no
+    // other content's meaning, and keeping it shared keeps names resolved once per document.
     if (!dict.isDictionary()) {
         dict = QPDFObjectHandle::newDictionary();
-        resources.replaceKey(category, dict);
-    } else if (dict.isIndirect()) {  // may be shared with other contents: add to a copy
-        dict = dict.shallowCopy();
         resources.replaceKey(category, dict);
     }
     std::string name;

@@ -47,6 +47,13 @@ struct ContentElement {
     std::vector<ContentElement> children;  // containers
     std::shared_ptr<Content> form;         // Form: its content, parsed with the state at this use
 
+    ContentElement() = default;
+    ContentElement(const ContentElement&) = default;
+    ContentElement& operator=(const ContentElement&) = default;
+    // Moves never throw, so growing element lists move elements instead of copying them.
+    ContentElement(ContentElement&&) noexcept = default;
+    ContentElement& operator=(ContentElement&&) noexcept = default;
+
     bool isContainer() const {
         return kind == ElementKind::TextObject || kind == ElementKind::Group ||
                kind == ElementKind::MarkedContent;

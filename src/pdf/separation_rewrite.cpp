@@ -102,6 +102,16 @@ private:
     // over a process space gets a base that paints nothing.
     QPDFObjectHandle replacement(const ColourSpaceRef& space) {
         if (!space) return QPDFObjectHandle::newNull();
+        // Resolved spaces are shared document-wide; the map holds each one, so its address
+        // stays its own while the document is rewritten.
+        auto seen = bySpace_.find(space.get());
+        if (seen != bySpace_.end()) return seen->second.second;
+        QPDFObjectHandle made = replacementOf(space);
+        bySpace_.emplace(space.get(), std::make_pair(space, made));
+        return made;
+    }
+
+    QPDFObjectHandle replacementOf(const ColourSpaceRef& space) {
         QPDFObjectHandle original = space->object;
         if (!original.isInitialized() || original.isNull()) return QPDFObjectHandle::newNull();
         const std::string key = original.unparse();
@@ -370,6 +380,7 @@ private:
     FormVariants variants_;
     ColourSpaceResolver::SharedCache cache_;
     std::map<std::string, QPDFObjectHandle> replacements_;
+    std::map<const ColourSpace*, std::pair<ColourSpaceRef, QPDFObjectHandle>> bySpace_;
     std::map<int, QPDFObjectHandle> nothing_;
     std::set<QPDFObjGen> done_;
     std::map<QPDFObjGen, bool> shadings_;
