@@ -37,10 +37,24 @@ public:
         ContentEditor editor(*content);
         walk(*content, content->elements, editor);
         editor.apply(pdf_);
+        hideAnnotations(page);
         return content->complete;
     }
 
     void finish() { variants_.finish(); }
+
+    // Annotations paint too: those not already optional join the catch-all group, so that a page
+    // with every group off shows nothing.
+    void hideAnnotations(QPDFObjectHandle page) {
+        QPDFObjectHandle annots = page.getKey("/Annots");
+        if (!annots.isArray()) return;
+        for (QPDFObjectHandle annot : annots.aitems()) {
+            if (!annot.isDictionary()) continue;
+            if (!allSeparations_ && hasOptionalContentMembership(annot.getKey("/OC"))) continue;
+            if (annot.getKey("/Subtype").isNameAndEquals("/Popup")) continue;  // shown through its parent
+            annot.replaceKey("/OC", special);
+        }
+    }
 
 private:
     // A run of sibling elements that go into one group, wrapped together.

@@ -202,3 +202,22 @@ TEST(SeparationLayers, NamesWithNumberSignsSurviveTheSave) {
     ASSERT_TRUE(vorlan::test::showOnlyGroups(out, shown, {name}));
     EXPECT_GT(vorlan::test::renderPage(shown, 1).inked(), 0);
 }
+
+TEST(SeparationLayers, AnnotationsJoinTheCatchAllGroup) {
+    if (!haveRenderers()) GTEST_SKIP() << "pdftoppm or qpdf missing";
+    TempDir dir;
+    TestPdf pdf;
+    QPDFObjectHandle appearance = pdf.stream("<< /Type /XObject /Subtype /Form /BBox [0 0 20 20] >>", "0 g 0 0 20 20 re f");
+    QPDFObjectHandle page = pdf.addPage("");
+    page.replaceKey("/Annots", QPDFObjectHandle::parse(&pdf.qpdf(), "[<< /Type /Annot /Subtype /Square /F 4 /Rect [10 10 30 30] "
+                                                                     "/AP << /N " + TestPdf::ref(appearance) + " >> >>]"));
+    const std::string in = (dir / "in.pdf").string(), out = (dir / "out.pdf").string();
+    pdf.write(in);
+    ASSERT_GT(vorlan::test::renderPage(in, 1).inked(), 0);
+    const char* seps[] = {"Gold"};
+    ASSERT_EQ(convertPDF(nullptr, in.c_str(), out.c_str(), seps, nullptr, 1, 0), 0);
+    EXPECT_EQ(vorlan::test::renderPage(out, 1).inked(), 0);
+    const std::string shown = (dir / "shown.pdf").string();
+    ASSERT_TRUE(vorlan::test::showOnlyGroups(out, shown, {kSpecialOCGName}));
+    EXPECT_GT(vorlan::test::renderPage(shown, 1).inked(), 0);
+}
