@@ -57,7 +57,7 @@ double readNumber(std::string_view token) {
 // A token that is a plain decimal with an optional sign ("-12.5"), read in one pass up to its
 // end (a space or the end of the text): the value readNumber gives, by the same exact rule as
 // readPlainDecimal. False, with nothing read, for any other token.
-bool readPlainToken(const char*& p, const char* end, double& value) {
+[[gnu::always_inline]] inline bool readPlainToken(const char*& p, const char* end, double& value) {
     static constexpr double kPowers[] = {1e0, 1e1, 1e2, 1e3, 1e4, 1e5, 1e6, 1e7, 1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
     const char* q = p;
     bool negative = false;
