@@ -4,6 +4,7 @@
 #include <qpdf/QPDFPageObjectHelper.hh>
 
 #include <algorithm>
+#include <cstring>
 
 namespace vorlan::pdf {
 namespace {
@@ -89,6 +90,22 @@ QPDFObjectHandle rewriteSpace(QPDFObjectHandle cs, const std::function<bool(cons
 
 }  // namespace
 
+std::string nameToken(const std::string& name) {
+    static const char* hex = "0123456789ABCDEF";
+    std::string token = "/";
+    for (size_t i = name.empty() || name[0] != '/' ? 0 : 1; i < name.size(); ++i) {
+        const unsigned char c = static_cast<unsigned char>(name[i]);
+        if (c < 0x21 || c > 0x7e || std::strchr("#()<>[]{}/%", c)) {
+            token += '#';
+            token += hex[c >> 4];
+            token += hex[c & 15];
+        } else {
+            token += static_cast<char>(c);
+        }
+    }
+    return token;
+}
+
 QPDFObjectHandle colorantsToNone(QPDFObjectHandle colourSpace,
                                  const std::function<bool(const std::string&)>& affected) {
     return rewriteSpace(colourSpace, affected, 0);
@@ -146,8 +163,9 @@ std::string ContentEditor::resourceName(const char* category, QPDFObjectHandle o
     for (int n = 1; name.empty(); ++n)
         if (!dict.hasKey(stem + std::to_string(n))) name = stem + std::to_string(n);
     dict.replaceKey(name, object);
-    names_[key] = name;
-    return name;
+    std::string token = nameToken(name);
+    names_[key] = token;
+    return token;
 }
 
 bool ContentEditor::wrapInOptionalContent(const ContentElement& first, const ContentElement& last,

@@ -37,7 +37,8 @@ public:
     void insertText(size_t at, std::string text) { insert(at, std::move(text), false); }
 
     // The name under which `object` is listed in the category ("/XObject", "/ColorSpace",
-    // "/Properties") of the content's own resources, adding it under prefix<n> when absent.
+    // "/Properties") of the content's own resources, adding it under prefix<n> when absent;
+    // returned as a name token to write into the content (escaped where needed).
     // Dictionaries shared with other contents only gain keys, so their users see no change.
     std::string resourceName(const char* category, QPDFObjectHandle object, const char* prefix);
 
@@ -62,6 +63,9 @@ private:
     std::vector<Edit> edits_;
     std::map<std::pair<std::string, QPDFObjGen>, std::string> names_;
 };
+
+// The content-stream token of a decoded name ("/A B" gives "/A#20B"; '#' is escaped too).
+std::string nameToken(const std::string& name);
 
 // Returns the colour space with every colorant for which `affected` is true renamed "None":
 // the name of a Separation, the names of a DeviceN (and the keys of an NChannel /Colorants

@@ -179,15 +179,29 @@ private:
     bool inPath_ = false;
 };
 
+// The decoded content of a form, pattern or glyph stream, or of all the streams of a page (joined
+// by newlines). Throws when a stream cannot be decoded, so that content that cannot be read is
+// never taken for empty content and replaced.
 std::string pipedBytes(QPDFObjectHandle owner) {
     Pl_Buffer buffer("content");
-    // Patterns and glyph procedures are content streams without the form dictionary entries that
-    // the page helper looks for: their data is piped directly.
+    auto pipe = [&](QPDFObjectHandle stream) {
+        if (!stream.isStream() || !stream.pipeStreamData(&buffer, 0, qpdf_dl_generalized))
+            throw std::runtime_error("undecodable content");
+    };
     if (owner.isStream()) {
-        if (!owner.pipeStreamData(&buffer, 0, qpdf_dl_generalized)) throw std::runtime_error("undecodable content");
+        pipe(owner);
     } else {
-        QPDFPageObjectHelper(owner).pipeContents(&buffer);
+        QPDFObjectHandle contents = owner.getKey("/Contents");
+        if (contents.isArray()) {
+            for (QPDFObjectHandle part : contents.aitems()) {
+                pipe(part);
+                buffer.write(reinterpret_cast<const unsigned char*>("\n"), 1);
+            }
+        } else if (!contents.isNull()) {
+            pipe(contents);
+        }
     }
+    buffer.finish();
     std::unique_ptr<Buffer> data(buffer.getBuffer());
     return std::string(reinterpret_cast<const char*>(data->getBuffer()), data->getSize());
 }

@@ -34,6 +34,7 @@ public:
 
     bool convertPage(QPDFObjectHandle page) {
         std::shared_ptr<Content> content = parsePageContent(page, &cache_);
+        if (!content->complete && content->bytes.empty()) return false;  // unreadable: left alone
         ContentEditor editor(*content);
         walk(*content, content->elements, editor);
         editor.apply(pdf_);
@@ -117,7 +118,7 @@ private:
 
     void convertForm(const ContentElement& e, ContentEditor& parent) {
         QPDFObjectHandle object = e.object;  // a handle copy: qpdf's accessors are not const
-        if (!e.form || !object.isStream()) return;
+        if (!e.form || !object.isStream() || (!e.form->complete && e.form->bytes.empty())) return;
         Content& form = *e.form;
         ContentEditor editor(form);
         walk(form, form.elements, editor);

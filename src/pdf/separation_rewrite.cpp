@@ -78,6 +78,7 @@ public:
 
     bool rewritePage(QPDFObjectHandle page) {
         std::shared_ptr<Content> content = parsePageContent(page, &cache_);
+        if (!content->complete && content->bytes.empty()) return false;  // unreadable: left alone
         ContentEditor editor(*content);
         if (keep_) editor.insertText(0, kKnockOutStart);
         rewrite(*content, content->elements, editor);
@@ -305,6 +306,7 @@ private:
     // Type 3 glyphs): edited in place.
     void rewriteStreamInPlace(QPDFObjectHandle stream, QPDFObjectHandle parentResources, bool knockOutStart) {
         std::shared_ptr<Content> content = parseFormContent(stream, parentResources, GraphicsState::initial(), &cache_);
+        if (!content->complete && content->bytes.empty()) return;
         ContentEditor editor(*content);
         if (knockOutStart) editor.insertText(0, kKnockOutStart);
         rewrite(*content, content->elements, editor);
@@ -331,7 +333,7 @@ private:
 
     void rewriteForm(const ContentElement& e, ContentEditor& parent) {
         QPDFObjectHandle form = e.object;
-        if (!e.form || !form.isStream()) return;
+        if (!e.form || !form.isStream() || (!e.form->complete && e.form->bytes.empty())) return;
         Content& content = *e.form;
         ContentEditor editor(content);
         rewrite(content, content.elements, editor);
@@ -367,6 +369,7 @@ private:
 
     QPDFObjectHandle rewriteAppearance(QPDFObjectHandle stream, QPDFObjectHandle pageResources) {
         std::shared_ptr<Content> content = parseFormContent(stream, pageResources, GraphicsState::initial(), &cache_);
+        if (!content->complete && content->bytes.empty()) return stream;
         ContentEditor editor(*content);
         if (keep_) editor.insertText(0, kKnockOutStart);
         rewrite(*content, content->elements, editor);

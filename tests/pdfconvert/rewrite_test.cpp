@@ -6,6 +6,7 @@
 #include <qpdf/Buffer.hh>
 #include <qpdf/QPDF.hh>
 
+#include "pdf/content_edit.h"
 #include "pdf/separation_rewrite.h"
 #include "plates.h"
 #include "render.h"
@@ -201,4 +202,31 @@ TEST(SeparationRewrite, AllIsKeptUnlessListedAndFailuresAreClean) {
     vorlan::test::writeFile(dir / "bad.pdf", "not a pdf");
     EXPECT_EQ(rewriteSeparations(nullptr, (dir / "bad.pdf").c_str(), keep.c_str(), {"Gold"}, true), 1);
     EXPECT_EQ(rewriteSeparations(nullptr, in.c_str(), nullptr, {"Gold"}, true), 1);
+}
+
+TEST(SeparationRewrite, NamesWithNumberSignsAndSpacesStayIntact) {
+    TempDir dir;
+    // Written by hand: qpdf itself would write the '#' unescaped. The resource key has one too.
+    const std::string in = (dir / "in.pdf").string(), keep = (dir / "keep.pdf").string();
+    vorlan::test::writeFile(in, vorlan::test::handWrittenPdf(
+        {"<< /Type /Catalog /Pages 2 0 R >>", "<< /Type /Pages /Kids [3 0 R] /Count 1 >>",
+         "<< /Type /Page /Parent 2 0 R /MediaBox [0 0 40 40] /Contents 4 0 R /Resources << /ColorSpace << "
+         "/S#231 [/Separation /Gold#231 /DeviceCMYK << /FunctionType 2 /Domain [0 1] /C0 [0 0 0 0] /C1 [0 0 1 0] "
+         "/N 1 >>] /T [/Separation /Tin /DeviceGray << /FunctionType 2 /Domain [0 1] /C0 [0] /C1 [1] /N 1 >>] >> >> >>",
+         "<< /Length 53 >>\nstream\n/S#231 cs 1 scn 0 0 9 9 re f /T cs 1 scn 9 9 9 9 re f\nendstream"}));
+    ASSERT_EQ(rewriteSeparations(nullptr, in.c_str(), keep.c_str(), {"Gold#1"}, true), 0);
+    std::string check;
+    EXPECT_TRUE(vorlan::test::qpdfCheckPasses(keep, &check)) << check;
+    QPDF pdf;
+    pdf.processFile(keep.c_str());
+    QPDFObjectHandle page = pdf.getAllPages()[0];
+    QPDFObjectHandle spaces = page.getKey("/Resources").getKey("/ColorSpace");
+    ASSERT_TRUE(spaces.hasKey("/S#1"));
+    EXPECT_EQ(spaces.getKey("/S#1").getArrayItem(1).getName(), "/Gold#1");
+    if (vorlan::test::haveProgram("gs")) {
+        auto plates = inked(vorlan::test::platePixels(keep, 1));
+        EXPECT_EQ(plates.size(), 1u);
+        EXPECT_GT(plates["Gold#1"], 0);
+    }
+    EXPECT_EQ(nameToken("/A B#(x)"), "/A#20B#23#28x#29");
 }
