@@ -1,17 +1,22 @@
 // Content tokenizer: byte ranges of numbers, names, strings, brackets and operators.
 #include "pdf/content_lexer.h"
 
-#include <cstring>
 
 namespace vorlan::pdf {
 
-bool isContentWhitespace(char c) {
-    return c == ' ' || c == '\n' || c == '\r' || c == '\t' || c == '\f' || c == '\0';
-}
-
-bool isContentDelimiter(char c) { return c && std::strchr("()<>[]{}/%", c) != nullptr; }
-
 namespace {
+
+// Character classes: 1 white space, 2 delimiter.
+struct CharClasses {
+    unsigned char table[256] = {};
+    CharClasses() {
+        for (unsigned char c : {' ', '\n', '\r', '\t', '\f', '\0'}) table[c] = 1;
+        for (const char* d = "()<>[]{}/%"; *d; ++d) table[static_cast<unsigned char>(*d)] = 2;
+    }
+};
+const CharClasses kClasses;
+
+inline unsigned char charClass(char c) { return kClasses.table[static_cast<unsigned char>(c)]; }
 
 int hexValue(char c) {
     if (c >= '0' && c <= '9') return c - '0';
@@ -21,6 +26,10 @@ int hexValue(char c) {
 }
 
 }  // namespace
+
+bool isContentWhitespace(char c) { return charClass(c) == 1; }
+
+bool isContentDelimiter(char c) { return charClass(c) == 2; }
 
 std::string decodeName(const std::string& bytes, size_t begin, size_t end) {
     std::string name = "/";
@@ -42,7 +51,7 @@ std::string decodeName(const std::string& bytes, size_t begin, size_t end) {
 ContentToken ContentLexer::next() {
     const size_t n = s_.size();
     for (;;) {
-        while (pos_ < n && isContentWhitespace(s_[pos_])) ++pos_;
+        while (pos_ < n && charClass(s_[pos_]) == 1) ++pos_;
         if (pos_ < n && s_[pos_] == '%') {
             while (pos_ < n && s_[pos_] != '\n' && s_[pos_] != '\r') ++pos_;
             continue;
@@ -58,7 +67,7 @@ ContentToken ContentLexer::next() {
     }
     const char c = s_[pos_];
     auto regular = [&] {
-        while (pos_ < n && !isContentWhitespace(s_[pos_]) && !isContentDelimiter(s_[pos_])) ++pos_;
+        while (pos_ < n && charClass(s_[pos_]) == 0) ++pos_;
     };
     switch (c) {
         case '/':

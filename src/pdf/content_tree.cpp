@@ -13,6 +13,15 @@ namespace {
 
 constexpr int kMaxFormDepth = 16;
 
+bool setsColour(const std::string& op) {
+    switch (op.size()) {
+        case 1: return op == "g" || op == "G" || op == "k" || op == "K";
+        case 2: return op == "cs" || op == "CS" || op == "sc" || op == "SC" || op == "rg" || op == "RG";
+        case 3: return op == "scn" || op == "SCN";
+        default: return false;
+    }
+}
+
 ElementKind containerKind(StepKind kind) {
     switch (kind) {
         case StepKind::GroupBegin: return ElementKind::Group;
@@ -24,9 +33,9 @@ ElementKind containerKind(StepKind kind) {
 class TreeBuilder : public ContentWalker {
 public:
     TreeBuilder(Content& content, ColourSpaceResolver::SharedCache* cache, GraphicsState start,
-                std::set<QPDFObjGen>& openForms, int depth)
+                std::set<QPDFObjGen>& openForms, int depth, StateLeaves states, FormCache* forms)
         : ContentWalker(content.resources, cache, std::move(start)),
-          content_(content), cache_(cache), openForms_(openForms), depth_(depth) {
+          content_(content), cache_(cache), openForms_(openForms), depth_(depth), states_(states), forms_(forms) {
         open_.emplace_back();  // the content itself
     }
 
@@ -95,15 +104,22 @@ protected:
             case StepKind::Form: {
                 ContentElement e = leaf(ElementKind::Form, step);
                 setPaint(e, step);
-                if (depth_ < kMaxFormDepth && openForms_.insert(step.object.getObjGen()).second) {
+                const QPDFObjGen id = step.object.getObjGen();
+                // Only forms with their own resources read the same at every use.
+                QPDFObjectHandle form = step.object;  // a handle copy: qpdf's accessors are not const
+                FormCache* shared = forms_ && form.getDict().getKey("/Resources").isDictionary() ? forms_ : nullptr;
+                if (shared) e.form = shared->find(id, state());
+                if (!e.form && depth_ < kMaxFormDepth && openForms_.insert(id).second) {
                     e.form = parse(step.object, state());
-                    openForms_.erase(step.object.getObjGen());
+                    openForms_.erase(id);
+                    if (shared) shared->add(id, state(), e.form);
                 }
                 add(std::move(e));
                 return;
             }
             default:  // inline image parts before EI are part of the inline image
                 if (step.op == "BI" || step.op == "ID") return;
+                if (states_ == StateLeaves::None || (states_ == StateLeaves::Colour && !setsColour(step.op))) return;
                 add(leaf(ElementKind::State, step));
                 return;
         }
@@ -174,6 +190,8 @@ private:
     ColourSpaceResolver::SharedCache* cache_;
     std::set<QPDFObjGen>& openForms_;
     int depth_;
+    StateLeaves states_;
+    FormCache* forms_;
     std::vector<ContentElement> open_;
     ContentElement path_;
     bool inPath_ = false;
@@ -208,7 +226,7 @@ std::string pipedBytes(QPDFObjectHandle owner) {
 
 std::shared_ptr<Content> build(QPDFObjectHandle owner, QPDFObjectHandle resources,
                                const GraphicsState& start, ColourSpaceResolver::SharedCache* cache,
-                               std::set<QPDFObjGen>& openForms, int depth) {
+                               std::set<QPDFObjGen>& openForms, int depth, StateLeaves states, FormCache* forms) {
     auto content = std::make_shared<Content>();
     content->owner = owner;
     content->resources = resources;
@@ -218,17 +236,35 @@ std::shared_ptr<Content> build(QPDFObjectHandle owner, QPDFObjectHandle resource
         content->complete = false;
         return content;
     }
-    TreeBuilder builder(*content, cache, start, openForms, depth);
+    TreeBuilder builder(*content, cache, start, openForms, depth, states, forms);
     content->complete = builder.walkBytes(content->bytes);
     builder.finish();
     return content;
 }
 
 std::shared_ptr<Content> TreeBuilder::parse(QPDFObjectHandle form, const GraphicsState& start) {
-    return build(form, streamResources(form, resources()), start, cache_, openForms_, depth_ + 1);
+    return build(form, streamResources(form, resources()), start, cache_, openForms_, depth_ + 1, states_, forms_);
 }
 
 }  // namespace
+
+FormCache::Key FormCache::keyOf(QPDFObjGen form, const GraphicsState& s) {
+    return {form, s.fill.get(), s.stroke.get(), s.fillSet, s.strokeSet, s.textRender, s.fillPattern, s.strokePattern};
+}
+
+bool FormCache::Key::operator<(const Key& o) const {
+    return std::tie(form, fill, stroke, fillSet, strokeSet, textRender, fillPattern, strokePattern) <
+           std::tie(o.form, o.fill, o.stroke, o.fillSet, o.strokeSet, o.textRender, o.fillPattern, o.strokePattern);
+}
+
+std::shared_ptr<Content> FormCache::find(QPDFObjGen form, const GraphicsState& state) const {
+    auto it = entries_.find(keyOf(form, state));
+    return it == entries_.end() ? nullptr : it->second.second;
+}
+
+void FormCache::add(QPDFObjGen form, const GraphicsState& state, std::shared_ptr<Content> content) {
+    if (content) entries_.emplace(keyOf(form, state), std::make_pair(state, std::move(content)));
+}
 
 bool ContentElement::paints() const {
     switch (kind) {
@@ -250,7 +286,8 @@ std::vector<ColourSpaceRef> ContentElement::colourSpaces() const {
     return spaces;
 }
 
-std::shared_ptr<Content> parsePageContent(QPDFObjectHandle page, ColourSpaceResolver::SharedCache* cache) {
+std::shared_ptr<Content> parsePageContent(QPDFObjectHandle page, ColourSpaceResolver::SharedCache* cache,
+                                          StateLeaves states, FormCache* forms) {
     std::set<QPDFObjGen> openForms;
     QPDFObjectHandle resources;
     try {
@@ -258,13 +295,14 @@ std::shared_ptr<Content> parsePageContent(QPDFObjectHandle page, ColourSpaceReso
     } catch (const std::exception&) {
         resources = QPDFObjectHandle::newNull();
     }
-    return build(page, resources, GraphicsState::initial(), cache, openForms, 0);
+    return build(page, resources, GraphicsState::initial(), cache, openForms, 0, states, forms);
 }
 
 std::shared_ptr<Content> parseFormContent(QPDFObjectHandle form, QPDFObjectHandle parentResources,
-                                          const GraphicsState& start, ColourSpaceResolver::SharedCache* cache) {
+                                          const GraphicsState& start, ColourSpaceResolver::SharedCache* cache,
+                                          StateLeaves states, FormCache* forms) {
     std::set<QPDFObjGen> openForms{form.getObjGen()};
-    return build(form, streamResources(form, parentResources), start, cache, openForms, 0);
+    return build(form, streamResources(form, parentResources), start, cache, openForms, 0, states, forms);
 }
 
 }  // namespace vorlan::pdf

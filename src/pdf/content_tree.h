@@ -13,7 +13,9 @@
 
 #include <qpdf/QPDFObjectHandle.hh>
 
+#include <map>
 #include <memory>
+#include <tuple>
 #include <string>
 #include <vector>
 
@@ -72,12 +74,41 @@ struct Content {
     bool complete = true;        // parsed to its end without damage
 };
 
+// Which operators that only change state become State leaves: all of them, only those that set
+// colours (cs CS sc scn SC SCN g G rg RG k K), or none. Leaving them out saves work for users
+// that edit only painting elements; the byte ranges of the other elements are the same.
+enum class StateLeaves { All, Colour, None };
+
+// Parsed form contents shared between uses that inherit the same colour state (opt-in): a form
+// used many times is parsed once per distinct state. The cache keeps the states it was built
+// with alive, so their colour spaces stay valid keys for the whole document.
+class FormCache {
+public:
+    std::shared_ptr<Content> find(QPDFObjGen form, const GraphicsState& state) const;
+    void add(QPDFObjGen form, const GraphicsState& state, std::shared_ptr<Content> content);
+
+private:
+    struct Key {
+        QPDFObjGen form;
+        const ColourSpace* fill;
+        const ColourSpace* stroke;
+        bool fillSet, strokeSet;
+        int textRender;
+        std::string fillPattern, strokePattern;
+        bool operator<(const Key& o) const;
+    };
+    static Key keyOf(QPDFObjGen form, const GraphicsState& state);
+    std::map<Key, std::pair<GraphicsState, std::shared_ptr<Content>>> entries_;
+};
+
 // Parses a page's content (all its streams as one). Forms are parsed at each use, with the state
 // at the use, nested up to a fixed depth; a form that (indirectly) uses itself is not entered
 // again. Never throws; damaged content yields the elements before the damage and complete=false.
-std::shared_ptr<Content> parsePageContent(QPDFObjectHandle page, ColourSpaceResolver::SharedCache* cache);
+std::shared_ptr<Content> parsePageContent(QPDFObjectHandle page, ColourSpaceResolver::SharedCache* cache,
+                                          StateLeaves states = StateLeaves::All, FormCache* forms = nullptr);
 // Parses a form XObject's content with the given starting state.
 std::shared_ptr<Content> parseFormContent(QPDFObjectHandle form, QPDFObjectHandle parentResources,
-                                          const GraphicsState& start, ColourSpaceResolver::SharedCache* cache);
+                                          const GraphicsState& start, ColourSpaceResolver::SharedCache* cache,
+                                          StateLeaves states = StateLeaves::All, FormCache* forms = nullptr);
 
 }  // namespace vorlan::pdf

@@ -4,6 +4,7 @@
 #include <qpdf/QPDFObjectHandle.hh>
 
 #include <exception>
+#include <map>
 #include <memory>
 
 #include "pdf/content_edit.h"
@@ -33,7 +34,7 @@ public:
     QPDFObjectHandle special = QPDFObjectHandle::newNull();
 
     bool convertPage(QPDFObjectHandle page) {
-        std::shared_ptr<Content> content = parsePageContent(page, &cache_);
+        std::shared_ptr<Content> content = parsePageContent(page, &cache_, StateLeaves::None, &forms_);
         if (!content->complete && content->bytes.empty()) return false;  // unreadable: left alone
         ContentEditor editor(*content);
         walk(*content, content->elements, editor);
@@ -119,11 +120,14 @@ private:
     void convertForm(const ContentElement& e, ContentEditor& parent) {
         QPDFObjectHandle object = e.object;  // a handle copy: qpdf's accessors are not const
         if (!e.form || !object.isStream() || (!e.form->complete && e.form->bytes.empty())) return;
-        Content& form = *e.form;
-        ContentEditor editor(form);
-        walk(form, form.elements, editor);
-        std::string bytes = editor.edited() ? editor.result() : form.bytes;
-        QPDFObjectHandle target = variants_.objectFor(object, form.bytes, std::move(bytes));
+        QPDFObjectHandle& target = formTargets_[e.form.get()];
+        if (!target.isInitialized()) {  // each parsed form is converted once, whatever its uses
+            Content& form = *e.form;
+            ContentEditor editor(form);
+            walk(form, form.elements, editor);
+            std::string bytes = editor.edited() ? editor.result() : form.bytes;
+            target = variants_.objectFor(object, form.bytes, std::move(bytes));
+        }
         if (!target.isSameObjectAs(object))
             parent.replace(e.begin, e.opBegin, parent.resourceName("/XObject", target, "Fm") + " ");
     }
@@ -201,6 +205,8 @@ private:
     bool allSeparations_;
     std::vector<std::string> table_;
     ColourSpaceResolver::SharedCache cache_;
+    FormCache forms_;                                   // parsed forms, shared between uses
+    std::map<const Content*, QPDFObjectHandle> formTargets_;  // what each parsed form became
 };
 
 }  // namespace

@@ -77,7 +77,7 @@ public:
         : pdf_(pdf), listed_(separations.begin(), separations.end()), keep_(keepListed), variants_(pdf) {}
 
     bool rewritePage(QPDFObjectHandle page) {
-        std::shared_ptr<Content> content = parsePageContent(page, &cache_);
+        std::shared_ptr<Content> content = parsePageContent(page, &cache_, StateLeaves::Colour, &forms_);
         if (!content->complete && content->bytes.empty()) return false;  // unreadable: left alone
         ContentEditor editor(*content);
         if (keep_) editor.insertText(0, kKnockOutStart);
@@ -305,7 +305,7 @@ private:
     // Content that starts from its own state wherever it is used (coloured tiling patterns,
     // Type 3 glyphs): edited in place.
     void rewriteStreamInPlace(QPDFObjectHandle stream, QPDFObjectHandle parentResources, bool knockOutStart) {
-        std::shared_ptr<Content> content = parseFormContent(stream, parentResources, GraphicsState::initial(), &cache_);
+        std::shared_ptr<Content> content = parseFormContent(stream, parentResources, GraphicsState::initial(), &cache_, StateLeaves::Colour);
         if (!content->complete && content->bytes.empty()) return;
         ContentEditor editor(*content);
         if (knockOutStart) editor.insertText(0, kKnockOutStart);
@@ -334,11 +334,14 @@ private:
     void rewriteForm(const ContentElement& e, ContentEditor& parent) {
         QPDFObjectHandle form = e.object;
         if (!e.form || !form.isStream() || (!e.form->complete && e.form->bytes.empty())) return;
-        Content& content = *e.form;
-        ContentEditor editor(content);
-        rewrite(content, content.elements, editor);
-        std::string bytes = editor.edited() ? editor.result() : content.bytes;
-        QPDFObjectHandle target = variants_.objectFor(form, content.bytes, std::move(bytes));
+        QPDFObjectHandle& target = formTargets_[e.form.get()];
+        if (!target.isInitialized()) {  // each parsed form is rewritten once, whatever its uses
+            Content& content = *e.form;
+            ContentEditor editor(content);
+            rewrite(content, content.elements, editor);
+            std::string bytes = editor.edited() ? editor.result() : content.bytes;
+            target = variants_.objectFor(form, content.bytes, std::move(bytes));
+        }
         if (!target.isSameObjectAs(form))
             parent.replace(e.begin, e.opBegin, parent.resourceName("/XObject", target, "Fm") + " ");
     }
@@ -368,7 +371,7 @@ private:
     }
 
     QPDFObjectHandle rewriteAppearance(QPDFObjectHandle stream, QPDFObjectHandle pageResources) {
-        std::shared_ptr<Content> content = parseFormContent(stream, pageResources, GraphicsState::initial(), &cache_);
+        std::shared_ptr<Content> content = parseFormContent(stream, pageResources, GraphicsState::initial(), &cache_, StateLeaves::Colour);
         if (!content->complete && content->bytes.empty()) return stream;
         ContentEditor editor(*content);
         if (keep_) editor.insertText(0, kKnockOutStart);
@@ -382,6 +385,8 @@ private:
     bool keep_;
     FormVariants variants_;
     ColourSpaceResolver::SharedCache cache_;
+    FormCache forms_;                                   // parsed forms, shared between uses
+    std::map<const Content*, QPDFObjectHandle> formTargets_;  // what each parsed form became
     std::map<std::string, QPDFObjectHandle> replacements_;
     std::map<const ColourSpace*, std::pair<ColourSpaceRef, QPDFObjectHandle>> bySpace_;
     std::map<int, QPDFObjectHandle> nothing_;
