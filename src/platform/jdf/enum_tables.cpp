@@ -1,6 +1,9 @@
 // Token tables of the enumerations the layer writes and reads.
 #include "platform/jdf/enum_tables.h"
 
+#include <mutex>
+#include <unordered_map>
+
 #include "platform/jdf/exception.h"
 
 namespace JDF::Tables {
@@ -44,10 +47,24 @@ const wchar_t* const RotatePolicy = L"Unknown,NoRotate,RotateOrthogonal,RotateCl
 const wchar_t* const SizePolicy = L"Unknown,ClipToMaxPage,Abort,FitToPage,ReduceToFit,Tile";
 const wchar_t* const BandOrdering = L"Unknown,BandMajor,ColorMajor";
 
+namespace {
+
+// The tables are constants: each is split into its tokens once and kept.
+const vWString& tokensOf(const wchar_t* table) {
+    static std::mutex lock;
+    static std::unordered_map<const wchar_t*, vWString> split;
+    std::lock_guard<std::mutex> guard(lock);
+    auto found = split.find(table);
+    if (found == split.end()) found = split.emplace(table, vWString(table, L",")).first;
+    return found->second;
+}
+
+}  // namespace
+
 WString Token(const wchar_t* table, int n, bool allowUnknown) {
     if (n < 0 || (n == 0 && !allowUnknown))
         throw JDFException("enumeration value " + std::to_string(n) + " cannot be written");
-    vWString tokens(table, L",");
+    const vWString& tokens = tokensOf(table);
     if (static_cast<size_t>(n) >= tokens.size())
         throw JDFException("enumeration value " + std::to_string(n) + " is out of range");
     return tokens[static_cast<size_t>(n)];
@@ -55,7 +72,7 @@ WString Token(const wchar_t* table, int n, bool allowUnknown) {
 
 int Number(const wchar_t* table, const WString& token) {
     if (token.empty()) return 0;
-    int i = vWString(table, L",").index(token);
+    int i = tokensOf(table).index(token);
     return i < 0 ? 0 : i;
 }
 
