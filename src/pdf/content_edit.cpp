@@ -187,7 +187,10 @@ void ContentEditor::remove(const ContentElement& e) {
         case ElementKind::TextRun:
             if (e.fills || e.strokes) {
                 insert(e.begin, "3 Tr ", false);
-                insert(e.end, " " + std::to_string(e.state.textRender) + " Tr", true);
+                std::string restore(" ");  // built in steps: g++ 12 warns falsely on "x" + to_string()
+                restore += std::to_string(e.state.textRender);
+                restore += " Tr";
+                insert(e.end, std::move(restore), true);
             }
             break;
         case ElementKind::Image:
