@@ -38,7 +38,8 @@ struct RewriteFixture {
     TempDir dir;
     std::string input = (dir / "in.pdf").string();
 
-    // Page 1: paths and text; page 2: images; page 3: shadings and patterns; page 4: forms, a
+    // Page 1: paths and text; page 2: images; page 3: shadings and patterns (an uncoloured one
+    // over a spot and one over CMYK); page 4: forms, a
     // Type 3 font and an annotation. Nothing overlaps, so knock-outs change no listed plate.
     RewriteFixture() {
         TestPdf pdf;
@@ -78,8 +79,10 @@ struct RewriteFixture {
         pdf.addPage("q " + slot(0) + " 20 20 re W n /GoldRamp sh Q "
                     "q /Pattern cs /CmykRamp scn " + square(1) + " Q "
                     "q /Pattern cs /Tile scn " + square(2) + " Q "
-                    "q /SilverPattern cs 1 /Stripes scn " + square(3) + " Q",
-                    "<< /ColorSpace << /SilverPattern [/Pattern " + silver + "] >> /Shading << /GoldRamp << "
+                    "q /SilverPattern cs 1 /Stripes scn " + square(3) + " Q "
+                    "q /CmykPattern cs 0 1 0 0 /Stripes scn " + square(4) + " Q",
+                    "<< /ColorSpace << /SilverPattern [/Pattern " + silver + "] /CmykPattern [/Pattern /DeviceCMYK] >> "
+                    "/Shading << /GoldRamp << "
                     "/ShadingType 2 /ColorSpace " + gold + " /Coords [10 0 30 0] /Function << /FunctionType 2 "
                     "/Domain [0 1] /C0 [0.2] /C1 [1] /N 1 >> >> >> /Pattern << /CmykRamp << /PatternType 2 "
                     "/Shading << /ShadingType 2 /ColorSpace /DeviceCMYK /Coords [50 0 70 0] /Function << "
