@@ -16,7 +16,7 @@
 #include <string>
 #include <vector>
 
-#include "pdf/pdf_inspection.h"
+#include "pdf/page_geometry.h"
 
 namespace fs = std::filesystem;
 using Clock = std::chrono::steady_clock;

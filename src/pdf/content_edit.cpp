@@ -240,13 +240,4 @@ void ContentEditor::apply(QPDF& pdf) {
     edits_.clear();
 }
 
-QPDFObjectHandle FormCopies::copyFor(QPDFObjectHandle form, const std::string& variant) {
-    auto key = std::make_pair(form.getObjGen(), variant);
-    auto it = copies_.find(key);
-    if (it != copies_.end()) return it->second;
-    QPDFObjectHandle copy = pdf_.makeIndirectObject(form.copyStream());
-    copies_.emplace(key, copy);
-    return copy;
-}
-
 }  // namespace vorlan::pdf

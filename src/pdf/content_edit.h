@@ -75,16 +75,4 @@ std::string nameToken(const std::string& name);
 QPDFObjectHandle colorantsToNone(QPDFObjectHandle colourSpace,
                                  const std::function<bool(const std::string&)>& affected);
 
-// Copy-on-write of form XObjects: one copy per (form, variant key), made on first request, so
-// that every use that needs the same edit shares one copy and the original stays for other uses.
-class FormCopies {
-public:
-    explicit FormCopies(QPDF& pdf) : pdf_(pdf) {}
-    QPDFObjectHandle copyFor(QPDFObjectHandle form, const std::string& variant);
-
-private:
-    QPDF& pdf_;
-    std::map<std::pair<QPDFObjGen, std::string>, QPDFObjectHandle> copies_;
-};
-
 }  // namespace vorlan::pdf

@@ -8,7 +8,7 @@
 #include "pdf/description_writer.h"
 #include "pdf/die_library.h"
 #include "pdf/pdf_document.h"
-#include "pdf/pdf_inspection.h"
+#include "pdf/page_geometry.h"
 #include "pdf/pdf_session.h"
 #include "pdf/xmp_inks.h"
 

@@ -9,7 +9,7 @@
 
 #include "pdf/page_inks.h"
 #include "pdf/pdf_document.h"
-#include "pdf/pdf_inspection.h"
+#include "pdf/page_geometry.h"
 #include "pdf/zipped_jdf_file_system.h"
 #include "plates.h"
 #include "test_support.h"

@@ -1,7 +1,7 @@
 // Page inks of generated files: every way content can paint with a spot colour.
 #include <gtest/gtest.h>
 
-#include "pdf/pdf_inspection.h"
+#include "pdf/page_geometry.h"
 #include "test_pdf.h"
 #include "test_support.h"
 

@@ -1,5 +1,5 @@
 // Page count, first-page size and page inks.
-#include "pdf/pdf_inspection.h"
+#include "pdf/page_geometry.h"
 
 #include <qpdf/QPDFPageObjectHelper.hh>
 

@@ -3,7 +3,7 @@
 
 #include <qpdf/QPDFObjectHandle.hh>
 
-#include "pdf/pdf_inspection.h"
+#include "pdf/page_geometry.h"
 #include "pdf/pdf_session.h"
 #include "pdf/zipped_jdf_file_system.h"
 #include "test_pdf.h"
