@@ -4,8 +4,6 @@
 //   pdf_ink_bench [--pages N] [--elements N] [--runs N] [--keep]
 // Target: the scan takes at most 1.5x the time of qpdf --check.
 #include <qpdf/QPDF.hh>
-#include <qpdf/QPDFPageDocumentHelper.hh>
-#include <qpdf/QPDFWriter.hh>
 
 #include <algorithm>
 #include <chrono>
@@ -17,13 +15,13 @@
 #include <vector>
 
 #include "pdf/page_geometry.h"
+#include "pdf_bench_builder.h"
 
 namespace fs = std::filesystem;
 using Clock = std::chrono::steady_clock;
+using namespace vorlan::bench;
 
 namespace {
-
-std::string ref(QPDFObjectHandle o) { return std::to_string(o.getObjectID()) + " 0 R"; }
 
 // One page's worth of painting: fills, strokes, text, images and form uses in spot, DeviceN and
 // process colours, each element choosing its colour first.
@@ -50,46 +48,19 @@ std::string pageContent(int page, int elements) {
 void generate(const fs::path& file, int pages, int elements) {
     QPDF pdf;
     pdf.emptyPDF();
-    auto tint = [&](const char* c1) {
-        return ref(pdf.makeIndirectObject(QPDFObjectHandle::parse(
-            std::string("<< /FunctionType 2 /Domain [0 1] /C0 [0 0 0 0] /C1 ") + c1 + " /N 1 >>")));
-    };
-    QPDFObjectHandle fn4 = QPDFObjectHandle::newStream(&pdf, "{ add 0 0 0 4 -1 roll dup 1 gt {pop 1} if }");
-    fn4.getDict().replaceKey("/FunctionType", QPDFObjectHandle::newInteger(4));
-    fn4.getDict().replaceKey("/Domain", QPDFObjectHandle::parse("[0 1 0 1]"));
-    fn4.getDict().replaceKey("/Range", QPDFObjectHandle::parse("[0 1 0 1 0 1 0 1]"));
     QPDFObjectHandle spaces = pdf.makeIndirectObject(QPDFObjectHandle::parse(
-        &pdf, "<< /CS0 [/Separation /Gold /DeviceCMYK " + tint("[0 0.2 0.8 0]") +
-                  "] /CS1 [/Separation /Varnish /DeviceCMYK " + tint("[0 0 0 0.1]") +
-                  "] /CS2 [/DeviceN [/Die /Crease] /DeviceCMYK " + ref(fn4) + "] >>"));
-    QPDFObjectHandle image = QPDFObjectHandle::newStream(&pdf, std::string(64, '\x40'));
-    image.getDict().replaceKey("/Type", QPDFObjectHandle::newName("/XObject"));
-    image.getDict().replaceKey("/Subtype", QPDFObjectHandle::newName("/Image"));
-    image.getDict().replaceKey("/Width", QPDFObjectHandle::newInteger(8));
-    image.getDict().replaceKey("/Height", QPDFObjectHandle::newInteger(8));
-    image.getDict().replaceKey("/BitsPerComponent", QPDFObjectHandle::newInteger(8));
-    image.getDict().replaceKey("/ColorSpace", QPDFObjectHandle::parse(
-        &pdf, "[/Separation /ImageSpot /DeviceCMYK " + tint("[0.5 0 0 0]") + "]"));
-    QPDFObjectHandle form = QPDFObjectHandle::newStream(&pdf, "/CS1 cs 1 scn 0 0 10 10 re f 0 g 2 2 5 5 re f");
-    form.getDict().replaceKey("/Type", QPDFObjectHandle::newName("/XObject"));
-    form.getDict().replaceKey("/Subtype", QPDFObjectHandle::newName("/Form"));
-    form.getDict().replaceKey("/BBox", QPDFObjectHandle::parse("[0 0 10 10]"));
-    form.getDict().replaceKey("/Resources", QPDFObjectHandle::parse(&pdf, "<< /ColorSpace " + ref(spaces) + " >>"));
+        &pdf, "<< /CS0 [/Separation /Gold /DeviceCMYK " + tintFunction(pdf, "[0 0.2 0.8 0]") +
+                  "] /CS1 [/Separation /Varnish /DeviceCMYK " + tintFunction(pdf, "[0 0 0 0.1]") +
+                  "] /CS2 [/DeviceN [/Die /Crease] /DeviceCMYK " + twoInkFunction(pdf) + "] >>"));
+    QPDFObjectHandle image = imageXObject(
+        pdf, 64,
+        QPDFObjectHandle::parse(&pdf, "[/Separation /ImageSpot /DeviceCMYK " + tintFunction(pdf, "[0.5 0 0 0]") + "]"));
+    QPDFObjectHandle form = formXObject(pdf, "/CS1 cs 1 scn 0 0 10 10 re f 0 g 2 2 5 5 re f",
+                                        QPDFObjectHandle::parse(&pdf, "<< /ColorSpace " + ref(spaces) + " >>"));
     QPDFObjectHandle resources = pdf.makeIndirectObject(QPDFObjectHandle::parse(
         &pdf, "<< /ColorSpace " + ref(spaces) + " /XObject << /Im0 " + ref(image) + " /Fm0 " + ref(form) +
                   " >> /Font << /F1 << /Type /Font /Subtype /Type1 /BaseFont /Helvetica >> >> >>"));
-    QPDFPageDocumentHelper helper(pdf);
-    for (int p = 0; p < pages; ++p) {
-        QPDFObjectHandle page = pdf.makeIndirectObject(QPDFObjectHandle::parse(
-            &pdf, "<< /Type /Page /MediaBox [0 0 595 842] /Resources " + ref(resources) + " >>"));
-        page.replaceKey("/Contents", QPDFObjectHandle::newStream(&pdf, pageContent(p, elements)));
-        helper.addPage(page, false);
-    }
-    QPDFWriter writer(pdf, file.c_str());
-    writer.setStaticID(true);
-    writer.setCompressStreams(true);  // Flate, as real files are
-    writer.setObjectStreamMode(qpdf_o_generate);
-    writer.write();
+    writePages(pdf, resources, pages, [&](int p) { return pageContent(p, elements); }, file);
 }
 
 double seconds(Clock::time_point a, Clock::time_point b) {
@@ -117,19 +88,10 @@ double timeInkScan(const fs::path& file, size_t& inkCount) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    int pages = 500, elements = 200, runs = 5;
-    bool keep = false;
-    for (int i = 1; i < argc; ++i) {
-        auto next = [&] { return i + 1 < argc ? std::atoi(argv[++i]) : 0; };
-        if (!std::strcmp(argv[i], "--pages")) pages = next();
-        else if (!std::strcmp(argv[i], "--elements")) elements = next();
-        else if (!std::strcmp(argv[i], "--runs")) runs = std::max(1, next());
-        else if (!std::strcmp(argv[i], "--keep")) keep = true;
-        else {
-            std::fprintf(stderr, "usage: pdf_ink_bench [--pages N] [--elements N] [--runs N] [--keep]\n");
-            return 2;
-        }
-    }
+    PdfBenchOptions options;
+    if (!parsePdfBenchOptions(argc, argv, "pdf_ink_bench", options)) return 2;
+    const int pages = options.pages, elements = options.elements, runs = options.runs;
+    const bool keep = options.keep;
     const fs::path file = fs::temp_directory_path() / ("vorlan-ink-bench-" + std::to_string(getpid()) + ".pdf");
     auto genStart = Clock::now();
     generate(file, pages, elements);

@@ -7,8 +7,6 @@
 // (user + system) of each child, which other load on a shared machine disturbs far less than
 // wall time; both are printed.
 #include <qpdf/QPDF.hh>
-#include <qpdf/QPDFPageDocumentHelper.hh>
-#include <qpdf/QPDFWriter.hh>
 
 #include <sys/resource.h>
 #include <sys/wait.h>
@@ -26,13 +24,13 @@
 
 #include "pdf/separation_layers.h"
 #include "pdf/separation_rewrite.h"
+#include "pdf_bench_builder.h"
 
 namespace fs = std::filesystem;
 using Clock = std::chrono::steady_clock;
+using namespace vorlan::bench;
 
 namespace {
-
-std::string ref(QPDFObjectHandle o) { return std::to_string(o.getObjectID()) + " 0 R"; }
 
 // About a third of the elements paint in spot colours (Separation fills and strokes, DeviceN
 // fills, uses of a shared spot form); the rest in process colours (fills, strokes, text, uses of
@@ -64,50 +62,20 @@ std::string pageContent(int page, int elements) {
 void generate(const fs::path& file, int pages, int elements) {
     QPDF pdf;
     pdf.emptyPDF();
-    auto tint = [&](const char* c1) {
-        return ref(pdf.makeIndirectObject(QPDFObjectHandle::parse(
-            std::string("<< /FunctionType 2 /Domain [0 1] /C0 [0 0 0 0] /C1 ") + c1 + " /N 1 >>")));
-    };
-    QPDFObjectHandle sum = QPDFObjectHandle::newStream(&pdf, "{ add 0 0 0 4 -1 roll dup 1 gt {pop 1} if }");
-    sum.getDict().replaceKey("/FunctionType", QPDFObjectHandle::newInteger(4));
-    sum.getDict().replaceKey("/Domain", QPDFObjectHandle::parse("[0 1 0 1]"));
-    sum.getDict().replaceKey("/Range", QPDFObjectHandle::parse("[0 1 0 1 0 1 0 1]"));
     QPDFObjectHandle spaces = pdf.makeIndirectObject(QPDFObjectHandle::parse(
-        &pdf, "<< /Gold [/Separation /Gold /DeviceCMYK " + tint("[0 0.2 0.8 0]") + "] /Silver [/Separation /Silver "
-              "/DeviceCMYK " + tint("[0 0 0 0.3]") + "] /Both [/DeviceN [/Gold /Silver] /DeviceCMYK " + ref(sum) + "] >>"));
-    auto form = [&](const std::string& content) {
-        QPDFObjectHandle f = QPDFObjectHandle::newStream(&pdf, content);
-        f.getDict().replaceKey("/Type", QPDFObjectHandle::newName("/XObject"));
-        f.getDict().replaceKey("/Subtype", QPDFObjectHandle::newName("/Form"));
-        f.getDict().replaceKey("/BBox", QPDFObjectHandle::parse("[0 0 10 10]"));
-        f.getDict().replaceKey("/Resources", QPDFObjectHandle::parse(&pdf, "<< /ColorSpace " + ref(spaces) + " >>"));
-        return f;
-    };
-    QPDFObjectHandle spotForm = form("/Gold cs 1 scn 0 0 10 10 re f /Silver cs 1 scn 2 2 5 5 re f");
-    QPDFObjectHandle processForm = form("0 0 1 0 k 0 0 10 10 re f 0 g 2 2 5 5 re f");
-    QPDFObjectHandle image = QPDFObjectHandle::newStream(&pdf, std::string(256, '\x40'));
-    image.getDict().replaceKey("/Type", QPDFObjectHandle::newName("/XObject"));
-    image.getDict().replaceKey("/Subtype", QPDFObjectHandle::newName("/Image"));
-    image.getDict().replaceKey("/Width", QPDFObjectHandle::newInteger(8));
-    image.getDict().replaceKey("/Height", QPDFObjectHandle::newInteger(8));
-    image.getDict().replaceKey("/BitsPerComponent", QPDFObjectHandle::newInteger(8));
-    image.getDict().replaceKey("/ColorSpace", QPDFObjectHandle::newName("/DeviceCMYK"));
+        &pdf, "<< /Gold [/Separation /Gold /DeviceCMYK " + tintFunction(pdf, "[0 0.2 0.8 0]") +
+                  "] /Silver [/Separation /Silver /DeviceCMYK " + tintFunction(pdf, "[0 0 0 0.3]") +
+                  "] /Both [/DeviceN [/Gold /Silver] /DeviceCMYK " + twoInkFunction(pdf) + "] >>"));
+    QPDFObjectHandle formResources = QPDFObjectHandle::parse(&pdf, "<< /ColorSpace " + ref(spaces) + " >>");
+    QPDFObjectHandle spotForm =
+        formXObject(pdf, "/Gold cs 1 scn 0 0 10 10 re f /Silver cs 1 scn 2 2 5 5 re f", formResources);
+    QPDFObjectHandle processForm = formXObject(pdf, "0 0 1 0 k 0 0 10 10 re f 0 g 2 2 5 5 re f", formResources);
+    QPDFObjectHandle image = imageXObject(pdf, 256, QPDFObjectHandle::newName("/DeviceCMYK"));
     QPDFObjectHandle resources = pdf.makeIndirectObject(QPDFObjectHandle::parse(
         &pdf, "<< /ColorSpace " + ref(spaces) + " /XObject << /Im0 " + ref(image) + " /SpotForm " + ref(spotForm) +
                   " /ProcessForm " + ref(processForm) +
                   " >> /Font << /F1 << /Type /Font /Subtype /Type1 /BaseFont /Helvetica >> >> >>"));
-    QPDFPageDocumentHelper helper(pdf);
-    for (int p = 0; p < pages; ++p) {
-        QPDFObjectHandle page = pdf.makeIndirectObject(QPDFObjectHandle::parse(
-            &pdf, "<< /Type /Page /MediaBox [0 0 595 842] /Resources " + ref(resources) + " >>"));
-        page.replaceKey("/Contents", QPDFObjectHandle::newStream(&pdf, pageContent(p, elements)));
-        helper.addPage(page, false);
-    }
-    QPDFWriter writer(pdf, file.c_str());
-    writer.setStaticID(true);
-    writer.setCompressStreams(true);
-    writer.setObjectStreamMode(qpdf_o_generate);
-    writer.write();
+    writePages(pdf, resources, pages, [&](int p) { return pageContent(p, elements); }, file);
 }
 
 struct Measure {
@@ -141,27 +109,13 @@ Measure qpdfLinearize(const fs::path& in, const fs::path& out) {
     });
 }
 
-double median(std::vector<double> v) {
-    std::sort(v.begin(), v.end());
-    return v[v.size() / 2];
-}
-
 }  // namespace
 
 int main(int argc, char** argv) {
-    int pages = 500, elements = 200, runs = 5;
-    bool keep = false;
-    for (int i = 1; i < argc; ++i) {
-        auto next = [&] { return i + 1 < argc ? std::atoi(argv[++i]) : 0; };
-        if (!std::strcmp(argv[i], "--pages")) pages = next();
-        else if (!std::strcmp(argv[i], "--elements")) elements = next();
-        else if (!std::strcmp(argv[i], "--runs")) runs = std::max(1, next());
-        else if (!std::strcmp(argv[i], "--keep")) keep = true;
-        else {
-            std::fprintf(stderr, "usage: pdfconvert_bench [--pages N] [--elements N] [--runs N] [--keep]\n");
-            return 2;
-        }
-    }
+    PdfBenchOptions options;
+    if (!parsePdfBenchOptions(argc, argv, "pdfconvert_bench", options)) return 2;
+    const int pages = options.pages, elements = options.elements, runs = options.runs;
+    const bool keep = options.keep;
     const fs::path dir = fs::temp_directory_path() / ("vorlan-convert-bench-" + std::to_string(getpid()));
     fs::create_directories(dir);
     const fs::path in = dir / "in.pdf";
