@@ -28,10 +28,6 @@ std::vector<std::string> allGroups(const std::string& pdf);
 // The names of the groups listed at the top level of the default configuration's /Order.
 std::vector<std::string> groupOrder(const std::string& pdf);
 
-// A PDF from the bodies of objects 1, 2, ... (object 1 the catalog), with a correct
-// cross-reference table: for input that qpdf's writer would change.
-std::string handWrittenPdf(const std::vector<std::string>& objects);
-
 // `qpdf --check` exit status 0 (warnings count as failure).
 bool qpdfCheckPasses(const std::string& pdf, std::string* output = nullptr);
 

@@ -71,24 +71,26 @@ bool haveProgram(const std::string& name) {
 }
 
 std::string minimalPdf(const std::string& content) {
-    // Objects are laid out in order so the cross-reference offsets can be computed as we go.
-    std::vector<std::string> objects = {
+    return handWrittenPdf({
         "<< /Type /Catalog /Pages 2 0 R >>",
         "<< /Type /Pages /Kids [3 0 R] /Count 1 >>",
         "<< /Type /Page /Parent 2 0 R /MediaBox [0 0 200 100] /Contents 4 0 R /Resources << >> >>",
         "<< /Length " + std::to_string(content.size()) + " >>\nstream\n" + content + "\nendstream",
-    };
-    std::string pdf = "%PDF-1.4\n";
+    });
+}
+
+std::string handWrittenPdf(const std::vector<std::string>& objects) {
+    std::string pdf = "%PDF-1.7\n";
     std::vector<size_t> offsets;
     for (size_t i = 0; i < objects.size(); ++i) {
         offsets.push_back(pdf.size());
         pdf += std::to_string(i + 1) + " 0 obj\n" + objects[i] + "\nendobj\n";
     }
-    size_t xref = pdf.size();
+    const size_t xref = pdf.size();
     pdf += "xref\n0 " + std::to_string(objects.size() + 1) + "\n0000000000 65535 f \n";
-    for (size_t off : offsets) {
-        char line[32];
-        std::snprintf(line, sizeof line, "%010zu 00000 n \n", off);
+    for (size_t offset : offsets) {
+        char line[24];
+        std::snprintf(line, sizeof line, "%010zu 00000 n \n", offset);
         pdf += line;
     }
     pdf += "trailer\n<< /Size " + std::to_string(objects.size() + 1) + " /Root 1 0 R >>\nstartxref\n" +

@@ -3,6 +3,7 @@
 
 #include <filesystem>
 #include <string>
+#include <vector>
 
 #include <gtest/gtest.h>
 
@@ -35,6 +36,9 @@ int runCommand(const std::string& command, std::string* output = nullptr);
 bool haveProgram(const std::string& name);
 // A minimal valid one-page PDF (optionally with a content stream) as bytes.
 std::string minimalPdf(const std::string& content = "0 0 m 10 10 l S");
+// A PDF of the given object bodies, numbered from 1 (object 1 is the catalog), with a
+// cross-reference table.
+std::string handWrittenPdf(const std::vector<std::string>& objects);
 
 }  // namespace vorlan::test
 
