@@ -299,6 +299,18 @@ private:
         }
     }
 
+    // The geometry content and mark objects share: CTM, ClipBox, Ord, TrimCTM and TrimSize.
+    template <typename Placed>
+    static void readPlacedGeometry(const PlacedAttributes& a, Placed* object) {
+        const char* ctm = PlacedAttributes::text(a.ctm);
+        object->CTM->text = copyText(ctm);
+        vorlan::geometry::parseCTM(ctm, object->CTM);
+        if (a.clipBox && *a.clipBox) object->ClipBox = readBox(a.clipBox);
+        object->Ord = readOrd(PlacedAttributes::text(a.ord));
+        if (a.trimCtm && *a.trimCtm) object->TrimCTM = readMatrix(a.trimCtm);
+        if (a.trimSize && *a.trimSize) object->TrimSize = readTrimSize(a.trimSize);
+    }
+
     void readContentObject(pugi::xml_node element, LD_Surface& surface) {
         auto* object = new LD_ContentObject;
         w_.contentObjects.push_back(object);
@@ -308,10 +320,7 @@ private:
         object->surfaceIndex = surface.index;
 
         PlacedAttributes a(element);
-        const char* ctm = PlacedAttributes::text(a.ctm);
-        object->CTM->text = copyText(ctm);
-        vorlan::geometry::parseCTM(ctm, object->CTM);
-        if (a.clipBox && *a.clipBox) object->ClipBox = readBox(a.clipBox);
+        readPlacedGeometry(a, object);
         const char* clipPath = PlacedAttributes::text(a.clipPath);
         if (!*clipPath) clipPath = PlacedAttributes::text(a.sourceClipPath);
         if (*clipPath) {
@@ -319,12 +328,8 @@ private:
             object->ClipPath = new std::vector<LD_ClipPathOperations*>;
             vorlan::geometry::parseClipPath(clipPath, *object->ClipPath);
         }
-
-        object->Ord = readOrd(PlacedAttributes::text(a.ord));
         ords_.emplace_back(object->Ord, surface.contentObjects.size() - 1);
 
-        if (a.trimCtm && *a.trimCtm) object->TrimCTM = readMatrix(a.trimCtm);
-        if (a.trimSize && *a.trimSize) object->TrimSize = readTrimSize(a.trimSize);
         object->CachePlacedObject = isTrue(a.cachePlacedObject);
         object->IgnoreClipForReuse = isTrue(a.ignoreClipForReuse);
 
@@ -340,14 +345,7 @@ private:
         object->markObjectIndex = w_.markObjectCount;
         object->surfaceIndex = surface.index;
 
-        PlacedAttributes a(element);
-        const char* ctm = PlacedAttributes::text(a.ctm);
-        object->CTM->text = copyText(ctm);
-        vorlan::geometry::parseCTM(ctm, object->CTM);
-        if (a.clipBox && *a.clipBox) object->ClipBox = readBox(a.clipBox);
-        object->Ord = readOrd(PlacedAttributes::text(a.ord));
-        if (a.trimCtm && *a.trimCtm) object->TrimCTM = readMatrix(a.trimCtm);
-        if (a.trimSize && *a.trimSize) object->TrimSize = readTrimSize(a.trimSize);
+        readPlacedGeometry(PlacedAttributes(element), object);
         ++w_.markObjectCount;
     }
 
