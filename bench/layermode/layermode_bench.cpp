@@ -42,11 +42,11 @@ std::string description(int surfaces) {
 // Seconds to consume a freshly generated job of that many surfaces (generation not counted).
 double consumeSeconds(int surfaces) {
     vorlan::test::TempDir tmp;
-    TicketSpec spec;
-    spec.sheets = surfaces / 2;
-    spec.objectsPerSurface = kObjects;
-    spec.pagePartitions = true;  // one Run partition per page, as this writer itself writes them
-    Job job = writeTicketJob(tmp.path(), spec, description(surfaces));
+    TicketSpec shape;
+    shape.sheets = surfaces / 2;
+    shape.objectsPerSurface = kObjects;
+    shape.pagePartitions = true;  // one Run partition per page, as this writer itself writes them
+    Job job = writeTicketJob(tmp.path(), shape, description(surfaces));
     setenv("VORLAN_JOB_STORE", (tmp / "store").c_str(), 1);
     auto start = std::chrono::steady_clock::now();
     int rc = consume(job);

@@ -43,9 +43,9 @@ void setSinglePage(JDF::JDFRunList& part, int32_t page) {
 }
 
 void writeFileSpec(LD_JDF& w, JDF::JDFLayoutElement& element, LD_PDF* pdf) {
-    JDF::JDFFileSpec spec = need(element.GetCreateFileSpec());
-    spec.SetURL(pdfURL(w, pdf));
-    spec.SetMimeType(pdf->mimeType);
+    JDF::JDFFileSpec fileSpec = need(element.GetCreateFileSpec());
+    fileSpec.SetURL(pdfURL(w, pdf));
+    fileSpec.SetMimeType(pdf->mimeType);
 }
 
 // The row with ordinal k: at position k unless rows were moved.

@@ -41,9 +41,9 @@ protected:
 
 TEST_F(DieCuts, OneSidedLayoutGainsTwoDieSheets) {
     VORLAN_REQUIRE_CORPUS();
-    TicketSpec spec;
-    spec.twoSided = false;
-    Job job = writeTicketJob(tmp.path(), spec, descriptionXml(kLayers, {}, &die));
+    TicketSpec shape;
+    shape.twoSided = false;
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLayers, {}, &die));
     TicketView t = run(job);
     ASSERT_EQ(t.count("//Sheet"), 4u);
     EXPECT_EQ(t.count("//Sheet[@Name='DieSheet']"), 2u);
@@ -136,9 +136,9 @@ TEST_F(DieCuts, DieNamesThePdfLacksFail) {
 }
 
 TEST_F(DieCuts, ObjectWithoutContentPageOnTheDieSurfaceFails) {
-    TicketSpec spec;
-    spec.extraOrd = 40;
-    Job job = writeTicketJob(tmp.path(), spec, descriptionXml(kLayers, {}, &die));
+    TicketSpec shape;
+    shape.extraOrd = 40;
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLayers, {}, &die));
     EXPECT_EQ(consume(job), 1);
     EXPECT_FALSE(fs::exists(job.output));
 }

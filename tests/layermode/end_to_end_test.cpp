@@ -74,10 +74,10 @@ TEST_F(LayerMode, TwoVersionsOnTheirOwnSheets) {
 
 TEST_F(LayerMode, EqualSwitchesForTheSamePageShareOneRow) {
     VORLAN_REQUIRE_CORPUS();
-    TicketSpec spec;
-    spec.extraOrd = 0;  // a second object on surface 0 showing page 0
+    TicketSpec shape;
+    shape.extraOrd = 0;  // a second object on surface 0 showing page 0
     VersionSpec v{"English", 1, true, {{0, {{0, "English", "German", "", ""}, {1, "English", "German", "", ""}}}}};
-    Job job = writeTicketJob(tmp.path(), spec, descriptionXml(kLanguages, {v}));
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLanguages, {v}));
     TicketView t = run(job);
     EXPECT_EQ(t.count("//InterpretingParams[@Run]"), 5u);
     EXPECT_EQ(t.count("//Surface[@Side='Front']/ContentObject[@Ord='4']"), 2u);
@@ -95,11 +95,11 @@ TEST_F(LayerMode, DisabledVersionContributesNothing) {
 
 TEST_F(LayerMode, MarkRunsAreCopiedWithNewContentRuns) {
     VORLAN_REQUIRE_CORPUS();
-    TicketSpec spec;
-    spec.marks = true;
-    spec.objectsPerSurface = 2;  // content, mark, content on every surface
+    TicketSpec shape;
+    shape.marks = true;
+    shape.objectsPerSurface = 2;  // content, mark, content on every surface
     VersionSpec v{"German", 1, true, {{0, {{0, "German", "English", "", ""}}}}};
-    Job job = writeTicketJob(tmp.path(), spec, descriptionXml(kLanguages, {v}));
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLanguages, {v}));
     TicketView t = run(job);
     // 8 rows from the ticket plus the German one; the mark objects that showed ordinal 0 follow it.
     EXPECT_EQ(t.count("/JDF/ResourcePool/RunList[@PartIDKeys='Run']"), 2u);
@@ -134,12 +134,12 @@ TEST_F(LayerMode, PageRangesSelectSurfacesAndDropEmptySheets) {
 
 TEST_F(LayerMode, SheetWithoutMediaReferencesANewMedia) {
     VORLAN_REQUIRE_CORPUS();
-    TicketSpec spec;
-    spec.sheets = 1;
-    spec.twoSided = false;
-    spec.sheetMedia = false;
-    spec.surfaceBoxes = false;
-    Job job = writeTicketJob(tmp.path(), spec, descriptionXml(kLanguages, {}));
+    TicketSpec shape;
+    shape.sheets = 1;
+    shape.twoSided = false;
+    shape.sheetMedia = false;
+    shape.surfaceBoxes = false;
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLanguages, {}));
     TicketView t = run(job);
     std::string id = t.attr("//Sheet/MediaRef", "rRef");
     EXPECT_EQ(t.attr("/JDF/ResourcePool/Media[@ID='" + id + "']", "Dimension"), "612 792");
@@ -182,17 +182,17 @@ TEST_F(LayerMode, FailedSaveIsReportedAndLeavesNothing) {
 }
 
 TEST_F(LayerMode, VersionOfAnObjectWithoutContentPageIsOutOfRange) {
-    TicketSpec spec;
-    spec.extraOrd = 40;  // content object 1 shows a page the run list does not have
+    TicketSpec shape;
+    shape.extraOrd = 40;  // content object 1 shows a page the run list does not have
     VersionSpec v{"German", 1, true, {{0, {{1, "German", "English", "", ""}}}}};
-    Job job = writeTicketJob(tmp.path(), spec, descriptionXml(kLanguages, {v}));
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLanguages, {v}));
     EXPECT_EQ(consume(job), 9);
     EXPECT_FALSE(fs::exists(job.output));
 }
 
 TEST_F(LayerMode, PdfWithoutLayerDataFailsInsteadOfAborting) {
-    TicketSpec spec;
-    spec.pdfs = {"a.pdf", "b.pdf"};  // the description describes only the first
-    Job job = writeTicketJob(tmp.path(), spec, descriptionXml(kLanguages, {}));
+    TicketSpec shape;
+    shape.pdfs = {"a.pdf", "b.pdf"};  // the description describes only the first
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLanguages, {}));
     EXPECT_EQ(consume(job), 1);
 }

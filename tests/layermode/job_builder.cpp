@@ -43,10 +43,10 @@ int newPdfPath(char* buffer, int size, void* userData) {
 
 }  // namespace
 
-std::string ticketXml(const TicketSpec& spec) {
-    const int surfacesPerSheet = spec.twoSided ? 2 : 1;
-    const int objects = spec.sheets * surfacesPerSheet * spec.objectsPerSurface;
-    const int files = static_cast<int>(spec.pdfs.size());
+std::string ticketXml(const TicketSpec& shape) {
+    const int surfacesPerSheet = shape.twoSided ? 2 : 1;
+    const int objects = shape.sheets * surfacesPerSheet * shape.objectsPerSurface;
+    const int files = static_cast<int>(shape.pdfs.size());
     std::ostringstream x;
     x << "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
       << "<JDF xmlns=\"http://www.CIP4.org/JDFSchema_1_1\" ID=\"n1\" JobPartID=\"n1\" Type=\"Imposition\""
@@ -55,44 +55,44 @@ std::string ticketXml(const TicketSpec& spec) {
     // k shows logical page (ordinal) k.
     x << "    <RunList ID=\"rDoc\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n";
     if (files == 1) {
-        x << runPartitions(spec.pdfs[0], objects, spec.pagePartitions);
+        x << runPartitions(shape.pdfs[0], objects, shape.pagePartitions);
     } else {
         for (int f = 0; f < files; ++f) {
             int pages = objects / files + (f < objects % files ? 1 : 0);
             x << "      <RunList Run=\"" << f << "\" Pages=\"" << (pages > 1 ? "0 ~ " + std::to_string(pages - 1) : "0")
-              << "\"><LayoutElement><FileSpec URL=\"" << spec.pdfs[static_cast<size_t>(f)]
+              << "\"><LayoutElement><FileSpec URL=\"" << shape.pdfs[static_cast<size_t>(f)]
               << "\" MimeType=\"application/pdf\"/></LayoutElement></RunList>\n";
         }
     }
     x << "    </RunList>\n";
-    if (spec.marks)
+    if (shape.marks)
         x << "    <RunList ID=\"rMarks\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n"
           << runPartitions("marks.pdf", 1, false) << "    </RunList>\n";
     x << "    <Layout ID=\"rLayout\" Class=\"Parameter\" Status=\"Available\">\n"
       << "      <Signature Name=\"Sig1\">\n";
     int object = 0;
-    for (int s = 0; s < spec.sheets; ++s) {
+    for (int s = 0; s < shape.sheets; ++s) {
         x << "        <Sheet Name=\"Sheet" << s + 1 << "\">\n";
-        if (spec.sheetMedia) x << "          <Media Dimension=\"600 800\" MediaType=\"Paper\"/>\n";
+        if (shape.sheetMedia) x << "          <Media Dimension=\"600 800\" MediaType=\"Paper\"/>\n";
         for (int side = 0; side < surfacesPerSheet; ++side) {
             x << "          <Surface Side=\"" << (side ? "Back" : "Front") << "\""
-              << (spec.surfaceBoxes ? " SurfaceContentsBox=\"0 0 600 800\"" : "") << ">\n";
-            for (int o = 0; o < spec.objectsPerSurface; ++o) {
-                if (spec.marks && o == 1) x << "            <MarkObject CTM=\"1 0 0 1 0 0\" Ord=\"0\"/>\n";
+              << (shape.surfaceBoxes ? " SurfaceContentsBox=\"0 0 600 800\"" : "") << ">\n";
+            for (int o = 0; o < shape.objectsPerSurface; ++o) {
+                if (shape.marks && o == 1) x << "            <MarkObject CTM=\"1 0 0 1 0 0\" Ord=\"0\"/>\n";
                 x << "            <ContentObject CTM=\"1 0 0 1 " << 10 * o << " 0\" Ord=\"" << object
                   << "\" ClipBox=\"0 0 300 400\" TrimSize=\"300 400\"/>\n";
                 ++object;
             }
-            if (spec.marks && spec.objectsPerSurface < 2) x << "            <MarkObject CTM=\"1 0 0 1 0 0\" Ord=\"0\"/>\n";
-            if (spec.extraOrd >= 0 && s == 0 && side == 0)
-                x << "            <ContentObject CTM=\"1 0 0 1 0 0\" Ord=\"" << spec.extraOrd << "\"/>\n";
+            if (shape.marks && shape.objectsPerSurface < 2) x << "            <MarkObject CTM=\"1 0 0 1 0 0\" Ord=\"0\"/>\n";
+            if (shape.extraOrd >= 0 && s == 0 && side == 0)
+                x << "            <ContentObject CTM=\"1 0 0 1 0 0\" Ord=\"" << shape.extraOrd << "\"/>\n";
             x << "          </Surface>\n";
         }
         x << "        </Sheet>\n";
     }
     x << "      </Signature>\n    </Layout>\n  </ResourcePool>\n  <ResourceLinkPool>\n"
       << "    <RunListLink rRef=\"rDoc\" Usage=\"Input\" ProcessUsage=\"Document\"/>\n";
-    if (spec.marks) x << "    <RunListLink rRef=\"rMarks\" Usage=\"Input\" ProcessUsage=\"Marks\"/>\n";
+    if (shape.marks) x << "    <RunListLink rRef=\"rMarks\" Usage=\"Input\" ProcessUsage=\"Marks\"/>\n";
     x << "    <LayoutLink rRef=\"rLayout\" Usage=\"Input\"/>\n  </ResourceLinkPool>\n</JDF>\n";
     return x.str();
 }
@@ -133,12 +133,12 @@ std::string descriptionXml(const std::vector<LayerSpec>& layers, const std::vect
     return x.str();
 }
 
-Job writeTicketJob(const fs::path& root, const TicketSpec& spec, const std::string& description) {
+Job writeTicketJob(const fs::path& root, const TicketSpec& shape, const std::string& description) {
     Job job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo", root / "out.jdf"};
     vorlan::test::writeFile(job.dataFile, "data file of job 1\n");
-    vorlan::test::writeFile(job.dataFolder / "ticket.jdf", ticketXml(spec));
-    for (const std::string& pdf : spec.pdfs) vorlan::test::writeFile(job.dataFolder / pdf, vorlan::test::minimalPdf());
-    if (spec.marks) vorlan::test::writeFile(job.dataFolder / "marks.pdf", vorlan::test::minimalPdf());
+    vorlan::test::writeFile(job.dataFolder / "ticket.jdf", ticketXml(shape));
+    for (const std::string& pdf : shape.pdfs) vorlan::test::writeFile(job.dataFolder / pdf, vorlan::test::minimalPdf());
+    if (shape.marks) vorlan::test::writeFile(job.dataFolder / "marks.pdf", vorlan::test::minimalPdf());
     if (!description.empty()) vorlan::test::writeFile(job.description, description);
     return job;
 }

@@ -23,7 +23,7 @@ struct TicketSpec {
 };
 
 // The ticket's XML.
-std::string ticketXml(const TicketSpec& spec);
+std::string ticketXml(const TicketSpec& shape);
 
 struct ContentSwitch {
     int index = 0;  // content object index
@@ -65,9 +65,9 @@ struct Job {
     std::filesystem::path output;      // X/out.jdf
 };
 
-// A ticket job: the ticket, a one-page PDF for every name in spec.pdfs (and marks.pdf), and the
+// A ticket job: the ticket, a one-page PDF for every name in shape.pdfs (and marks.pdf), and the
 // description (none when empty).
-Job writeTicketJob(const std::filesystem::path& root, const TicketSpec& spec, const std::string& description);
+Job writeTicketJob(const std::filesystem::path& root, const TicketSpec& shape, const std::string& description);
 // A bare-PDF job: X/job1.pdf is the data file.
 Job writeBarePdfJob(const std::filesystem::path& root, const std::string& description);
 
