@@ -134,18 +134,7 @@ DESCRIPTION = description(((0, 1), (2, 3)), """  <DieCut name="Die" enable="true
 """)
 
 # The bare PDF: each version names the PDF's pages (surface n = page n).
-BARE_DESCRIPTION = description(((0, 1), (0, 1))) + LAYERS + """  <Versions>
-    <Version name="English" enable="true" copies="500">
-      <Surface index="0"><ContentObject index="0" LayerNameOn="English" LayerNameOff="German"/></Surface>
-      <Surface index="1"><ContentObject index="1" LayerNameOn="English" LayerNameOff="German"/></Surface>
-    </Version>
-    <Version name="German" enable="true" copies="300">
-      <Surface index="0"><ContentObject index="0" LayerNameOn="German" LayerNameOff="English"/></Surface>
-      <Surface index="1"><ContentObject index="1" LayerNameOn="German" LayerNameOff="English"/></Surface>
-    </Version>
-  </Versions>
-</OptionalContentGroupData>
-"""
+BARE_DESCRIPTION = description(((0, 1), (0, 1)))
 
 
 def main():

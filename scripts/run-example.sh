@@ -12,13 +12,22 @@ rm -rf "$example"
 python3 examples/generate_example.py "$example"
 export VORLAN_JOB_STORE="$PWD/$example/jobstore"
 
+vorlan=build/dev/tools/vorlan/vorlan
+# Job 1 prints its die line: the job attribute the print server would set.
+"$vorlan" job-attr 1 KVPrintDieLine True
+
 status=0
-build/dev/tools/vorlan/vorlan consume \
+echo "== job 1: a ticket with two sheets, an English and a German version, a die cut"
+"$vorlan" consume \
   --impinfo "$example/job1.impinfo" --job-folder "$example" --out-dir "$example/out" \
   "$example/job1.0001" "$example/versioned.jdf" || status=$?
+echo "== job 2: a bare PDF with the same two versions"
+"$vorlan" consume \
+  --impinfo "$example/job2.impinfo" --job-folder "$example" --out-dir "$example/out" \
+  "$example/job2.pdf" "$example/bare.jdf" || status=$?
 
 if [ -f "$example/versioned.jdf" ]; then
-  echo "---- $example/versioned.jdf"
+  echo "---- $example/versioned.jdf (README: 'The example jobs and what their tickets say')"
   cat "$example/versioned.jdf"
 fi
 exit $status

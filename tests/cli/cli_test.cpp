@@ -60,3 +60,39 @@ TEST(Cli, ValidSaysValidOrNotValid) {
     EXPECT_EQ(run("valid " + (dir / "bad.xml").string(), &output), 1);
     EXPECT_EQ(output, "not valid\n");
 }
+
+TEST(Cli, BundledExampleJobsGiveVersionedTickets) {
+    if (!vorlan::test::haveProgram("python3")) GTEST_SKIP() << "python3 not installed";
+    TempDir dir;
+    const std::string example = (dir / "example").string();
+    ASSERT_EQ(runCommand(std::string("python3 ") + VORLAN_SOURCE_DIR + "/examples/generate_example.py " + example), 0);
+    const std::string env = "VORLAN_JOB_STORE=" + (dir / "store").string() + " ";
+    const std::string common = " --job-folder " + example + " --out-dir " + example + "/out ";
+    std::string output;
+    ASSERT_EQ(runCommand(env + cli() + " job-attr 1 KVPrintDieLine True"), 0);
+    EXPECT_EQ(runCommand(env + cli() + " consume --impinfo " + example + "/job1.impinfo" + common + example +
+                             "/job1.0001 " + example + "/versioned.jdf",
+                         &output),
+              0)
+        << output;
+    const std::string firstConverted = vorlan::test::readFile(example + "/out/vorlan-output-1.pdf");
+    EXPECT_FALSE(firstConverted.empty());
+    EXPECT_EQ(runCommand(env + cli() + " consume --impinfo " + example + "/job2.impinfo" + common + example +
+                             "/job2.pdf " + example + "/bare.jdf",
+                         &output),
+              0)
+        << output;
+    // The second job never takes the first job's output name.
+    EXPECT_EQ(vorlan::test::readFile(example + "/out/vorlan-output-1.pdf"), firstConverted);
+    const std::string ticket = vorlan::test::readFile(example + "/versioned.jdf");
+    EXPECT_NE(ticket.find("KAV_tkt:VersionName=\"English\""), std::string::npos);
+    EXPECT_NE(ticket.find("KAV_tkt:VersionName=\"German\""), std::string::npos);
+    EXPECT_NE(ticket.find("DieSheet"), std::string::npos);
+    if (vorlan::test::corpusDir().empty() || !vorlan::test::haveProgram("xmllint")) return;
+    const std::string schema = (vorlan::test::corpusDir() / "jdf-schema/xmllint-patched/JDF_1.8/JDF.xsd").string();
+    EXPECT_EQ(runCommand("xmllint --noout --schema " + schema + " " + example + "/versioned.jdf " + example +
+                             "/bare.jdf",
+                         &output),
+              0)
+        << output;
+}

@@ -39,7 +39,12 @@ struct OutputNamer {
 int nameNextOutputFile(char* buffer, int size, void* userData) {
     auto* namer = static_cast<OutputNamer*>(userData);
     if (!namer || !buffer || size <= 0) return 1;
-    std::string path = (namer->folder / ("vorlan-output-" + std::to_string(++namer->counter) + ".pdf")).string();
+    // Never hand out a name that is taken: an earlier job's output stays intact.
+    std::string path;
+    std::error_code ec;
+    do {
+        path = (namer->folder / ("vorlan-output-" + std::to_string(++namer->counter) + ".pdf")).string();
+    } while (fs::exists(path, ec));
     if (path.size() + 1 > static_cast<size_t>(size)) {
         buffer[0] = '\0';
         return 1;
