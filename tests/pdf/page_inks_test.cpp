@@ -69,53 +69,45 @@ TEST(PageInks, EveryPaintingOperatorInFirstUseOrder) {
                                     "InlineInk", "ShadeInk", "DevA", "DevB", "NchA", "PatInk"}));
 }
 
-TEST(PageInks, SharedFormsCountOncePerPage) {
+// Per page: a shared form counts once, a form painting with the current colour takes its use's,
+// and a form drawing itself terminates.
+TEST(PageInks, FormsCountOncePerPageInheritTheirUseAndTerminate) {
     TempDir dir;
     TestPdf pdf;
-    QPDFObjectHandle form = pdf.form("/CS0 cs 1 scn 0 0 5 5 re f /CS0 CS 1 SCN 0 0 m 1 1 l S",
-                                     "<< /ColorSpace << /CS0 " + pdf.separation("Shared") + " >> >>");
-    std::string resources = "<< /XObject << /Fm1 " + TestPdf::ref(form) + " >> >>";
+    QPDFObjectHandle shared = pdf.form("/CS0 cs 1 scn 0 0 5 5 re f /CS0 CS 1 SCN 0 0 m 1 1 l S",
+                                       "<< /ColorSpace << /CS0 " + pdf.separation("Shared") + " >> >>");
+    QPDFObjectHandle plain = pdf.form("0 0 5 5 re f");
+    QPDFObjectHandle loop = pdf.form("/CS0 cs 1 scn 0 0 1 1 re f /Fm3 Do");
+    loop.getDict().replaceKey("/Resources", QPDFObjectHandle::parse(&pdf.qpdf(),
+        "<< /ColorSpace << /CS0 " + pdf.separation("Loop") + " >> /XObject << /Fm3 " + TestPdf::ref(loop) + " >> >>"));
+    std::string resources = "<< /ColorSpace << /CS0 " + pdf.separation("Outer") + " >> /XObject << /Fm1 " +
+                            TestPdf::ref(shared) + " /Fm2 " + TestPdf::ref(plain) + " /Fm3 " + TestPdf::ref(loop) + " >> >>";
     pdf.addPage("/Fm1 Do /Fm1 Do", resources);
     pdf.addPage("0 0 1 1 re f", "<< >>");
     pdf.addPage("q /Fm1 Do Q", resources);
-    EXPECT_EQ(scan(pdf, dir), (Inks{"Shared", "Shared"}));
+    pdf.addPage("/CS0 cs 1 scn /Fm2 Do", resources);
+    pdf.addPage("/Fm3 Do", resources);
+    EXPECT_EQ(scan(pdf, dir), (Inks{"Shared", "Shared", "Outer", "Loop"}));
 }
 
-TEST(PageInks, FormsInheritTheColourOfTheirUse) {
-    TempDir dir;
-    TestPdf pdf;
-    QPDFObjectHandle form = pdf.form("0 0 5 5 re f");  // paints with whatever fill is current
-    std::string resources = "<< /ColorSpace << /CS0 " + pdf.separation("Outer") + " >> /XObject << /Fm1 " +
-                            TestPdf::ref(form) + " >> >>";
-    pdf.addPage("/CS0 cs 1 scn /Fm1 Do", resources);
-    EXPECT_EQ(scan(pdf, dir), (Inks{"Outer"}));
-}
-
-TEST(PageInks, IndexedAndIccSpacesAndNamesWithEscapes) {
+// Indexed and ICC spaces, names needing escapes, content in an OFF layer and a rotated page.
+TEST(PageInks, SpaceKindsEscapedNamesLayersAndRotation) {
     TempDir dir;
     TestPdf pdf;
     QPDFObjectHandle icc = pdf.stream("<< /N 4 >>", "not a real profile");
+    QPDFObjectHandle ocg = pdf.object("<< /Type /OCG /Name (Layer) >>");
+    pdf.qpdf().getRoot().replaceKey("/OCProperties", QPDFObjectHandle::parse(&pdf.qpdf(),
+        "<< /OCGs [" + TestPdf::ref(ocg) + "] /D << /OFF [" + TestPdf::ref(ocg) + "] >> >>"));
     std::string resources = "<< /ColorSpace << /I0 [/Indexed " + pdf.separation("Base Spot") +
                             " 1 <00FF>] /ICC [/ICCBased " + TestPdf::ref(icc) + "] /Odd " +
-                            pdf.separation("PANTONE 871 C/\xC3\xA9") + " >> >>";
+                            pdf.separation("PANTONE 871 C/\xC3\xA9") + " /CS0 " + pdf.separation("Layered") +
+                            " >> /Properties << /oc1 " + TestPdf::ref(ocg) + " >> >>";
     pdf.addPage("/I0 cs 1 sc 0 0 1 1 re f /ICC cs 0 0 0 1 sc 0 0 1 1 re f /Odd cs 1 sc 0 0 1 1 re f", resources);
-    EXPECT_EQ(scan(pdf, dir), (Inks{"Base Spot", "PANTONE 871 C/\xC3\xA9"}));
-}
-
-TEST(PageInks, ExistingOptionalContentAndRotatedPagesStillCount) {
-    TempDir dir;
-    TestPdf pdf;
-    QPDFObjectHandle ocg = pdf.object("<< /Type /OCG /Name (Layer) >>");
-    pdf.qpdf().getRoot().replaceKey(
-        "/OCProperties", QPDFObjectHandle::parse(&pdf.qpdf(), "<< /OCGs [" + TestPdf::ref(ocg) +
-                                                                   "] /D << /OFF [" + TestPdf::ref(ocg) + "] >> >>"));
-    std::string resources = "<< /ColorSpace << /CS0 " + pdf.separation("Layered") + " >> /Properties << /oc1 " +
-                            TestPdf::ref(ocg) + " >> >>";
     TestPdf::PageOptions turned;
     turned.rotate = 90;
     turned.cropBox = "[10 10 50 50]";
     pdf.addPage("/OC /oc1 BDC /CS0 cs 1 scn 0 0 1 1 re f EMC", resources, turned);
-    EXPECT_EQ(scan(pdf, dir), (Inks{"Layered"}));
+    EXPECT_EQ(scan(pdf, dir), (Inks{"Base Spot", "PANTONE 871 C/\xC3\xA9", "Layered"}));
 }
 
 TEST(PageInks, DamagedContentKeepsWhatCameBefore) {
@@ -125,15 +117,4 @@ TEST(PageInks, DamagedContentKeepsWhatCameBefore) {
     // An unbalanced Q, a self-referencing colour space, an unknown resource and a broken tail.
     pdf.addPage("Q Q /CS1 cs /Nope cs 0 0 1 1 re f /CS0 cs 1 scn 0 0 1 1 re f BI /W 1 ID", resources);
     EXPECT_EQ(scan(pdf, dir), (Inks{"Before"}));
-}
-
-TEST(PageInks, SelfReferencingFormsTerminate) {
-    TempDir dir;
-    TestPdf pdf;
-    QPDFObjectHandle form = pdf.form("/CS0 cs 1 scn 0 0 1 1 re f /Fm1 Do");
-    form.getDict().replaceKey(
-        "/Resources", QPDFObjectHandle::parse(&pdf.qpdf(), "<< /ColorSpace << /CS0 " + pdf.separation("Loop") +
-                                                              " >> /XObject << /Fm1 " + TestPdf::ref(form) + " >> >>"));
-    pdf.addPage("/Fm1 Do", "<< /XObject << /Fm1 " + TestPdf::ref(form) + " >> >>");
-    EXPECT_EQ(scan(pdf, dir), (Inks{"Loop"}));
 }

@@ -114,29 +114,22 @@ std::string xmlText(const std::string& text) {
 std::string eskoXmp(const std::vector<TestInk>& inks) {
     std::string items;
     for (const TestInk& ink : inks) {
-        items += "       <rdf:li rdf:parseType=\"Resource\">\n";
-        if (!ink.name.empty()) items += "        <egInk:name>" + xmlText(ink.name) + "</egInk:name>\n";
-        if (!ink.type.empty()) items += "        <egInk:type>" + ink.type + "</egInk:type>\n";
-        items += "        <egInk:book>PANTONE+ Solid Coated</egInk:book>\n";
-        if (!ink.attribute.empty()) items += "        <egInk:attribute>" + ink.attribute + "</egInk:attribute>\n";
-        items += "       </rdf:li>\n";
+        items += "<rdf:li rdf:parseType=\"Resource\">\n";
+        if (!ink.name.empty()) items += " <egInk:name>" + xmlText(ink.name) + "</egInk:name>\n";
+        if (!ink.type.empty()) items += " <egInk:type>" + ink.type + "</egInk:type>\n";
+        items += " <egInk:book>PANTONE+ Solid Coated</egInk:book>\n";
+        if (!ink.attribute.empty()) items += " <egInk:attribute>" + ink.attribute + "</egInk:attribute>\n";
+        items += "</rdf:li>\n";
     }
+    // A packet as the editor writes it, with an unrelated description before the ink list.
     return "<?xpacket begin=\"\xEF\xBB\xBF\" id=\"W5M0MpCehiHzreSzNTczkc9d\"?>\n"
-           "<x:xmpmeta xmlns:x=\"adobe:ns:meta/\">\n"
-           " <rdf:RDF xmlns:rdf=\"http://www.w3.org/1999/02/22-rdf-syntax-ns#\">\n"
-           "  <rdf:Description rdf:about=\"\" xmlns:dc=\"http://purl.org/dc/elements/1.1/\">\n"
-           "   <dc:format>application/pdf</dc:format>\n"
-           "  </rdf:Description>\n"
-           "  <rdf:Description rdf:about=\"\"\n"
-           "    xmlns:egGr=\"http://ns.esko-graphics.com/grinfo/1.0/\"\n"
-           "    xmlns:egInk=\"http://ns.esko-graphics.com/inkinfo/1.0/\">\n"
-           "   <egGr:inks>\n"
-           "    <rdf:Seq>\n" + items +
-           "    </rdf:Seq>\n"
-           "   </egGr:inks>\n"
-           "  </rdf:Description>\n"
-           " </rdf:RDF>\n"
-           "</x:xmpmeta>\n"
+           "<x:xmpmeta xmlns:x=\"adobe:ns:meta/\"><rdf:RDF xmlns:rdf=\"http://www.w3.org/1999/02/22-rdf-syntax-ns#\">\n"
+           "<rdf:Description rdf:about=\"\" xmlns:dc=\"http://purl.org/dc/elements/1.1/\">"
+           "<dc:format>application/pdf</dc:format></rdf:Description>\n"
+           "<rdf:Description rdf:about=\"\" xmlns:egGr=\"http://ns.esko-graphics.com/grinfo/1.0/\"\n"
+           " xmlns:egInk=\"http://ns.esko-graphics.com/inkinfo/1.0/\">\n"
+           "<egGr:inks><rdf:Seq>\n" + items + "</rdf:Seq></egGr:inks>\n"
+           "</rdf:Description></rdf:RDF></x:xmpmeta>\n"
            "<?xpacket end=\"w\"?>";
 }
 

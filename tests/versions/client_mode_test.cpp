@@ -45,13 +45,11 @@ protected:
 
 TEST_F(ClientModeTest, SeparationModeWithoutDieDropsEveryLayer) {
     readAndPrune(false, "");
-    EXPECT_TRUE(object().layerNameOn.empty());
-    EXPECT_TRUE(object().layerNameOff.empty());
+    EXPECT_TRUE(object().layerNameOn.empty() && object().layerNameOff.empty());
     EXPECT_EQ(names(object().sepNameOn), Names{L"Cyan"});
     EXPECT_EQ(names(object().sepNameOff), Names{L"White"});
     XMLLayerData& record = layers(nullptr);
-    EXPECT_TRUE(record.layerOCGNames.empty());
-    EXPECT_TRUE(record.layerDisplayNames.empty());
+    EXPECT_TRUE(record.layerOCGNames.empty() && record.layerDisplayNames.empty());
     // Layer names leave the default lists too; separation data is untouched.
     EXPECT_EQ(names(record.defaultOnOCGNames), Names{L"Cyan"});
     EXPECT_EQ(names(record.defaultOffOCGNames), (Names{L"CutContour", L"White"}));
@@ -73,8 +71,7 @@ TEST_F(ClientModeTest, SeparationModeKeepsTheDieLayers) {
 
 TEST_F(ClientModeTest, LayerModeWithDieKeepsOnlyTheFirstDiesSeparations) {
     readAndPrune(true, kContourDie);
-    EXPECT_TRUE(object().sepNameOn.empty());
-    EXPECT_TRUE(object().sepNameOff.empty());
+    EXPECT_TRUE(object().sepNameOn.empty() && object().sepNameOff.empty());
     EXPECT_EQ(names(object().layerNameOn), Names{L"Base"});
     EXPECT_EQ(names(object().layerNameOff), Names{L"Cut"});
     XMLLayerData& record = layers(nullptr);
@@ -90,8 +87,7 @@ TEST_F(ClientModeTest, LayerModeWithDieKeepsOnlyTheFirstDiesSeparations) {
 TEST_F(ClientModeTest, LayerModeWithoutDieDropsEverySeparation) {
     readAndPrune(true, "");
     XMLLayerData& record = layers(nullptr);
-    EXPECT_TRUE(record.sepOCGNames.empty());
-    EXPECT_TRUE(record.sepDisplayNames.empty());
+    EXPECT_TRUE(record.sepOCGNames.empty() && record.sepDisplayNames.empty());
     EXPECT_EQ(names(record.defaultOnOCGNames), Names{L"Base"});
     EXPECT_EQ(names(record.defaultOffOCGNames), Names{L"Cut"});
 }
@@ -112,6 +108,7 @@ TEST_F(ClientModeTest, ANameTwiceInADefaultListLosesOnlyOneEntry) {
 }
 
 TEST_F(ClientModeTest, TicketJobPrunesEveryPdfsRecord) {
+    EXPECT_EQ(worker.applyClientModeChangesToXMLBufferData(), LD_OK);  // nothing read, nothing to do
     giveTicket(2, 1);
     ASSERT_EQ(read(R"(<OptionalContentGroupData>
         <OptionalLayer OCGName="L0"/><OptionalLayer OCGName="S0" isSep="true"/>
@@ -124,9 +121,4 @@ TEST_F(ClientModeTest, TicketJobPrunesEveryPdfsRecord) {
         EXPECT_TRUE(record->layerOCGNames.empty());
         EXPECT_EQ(record->sepOCGNames.size(), 1u);
     }
-}
-
-TEST_F(ClientModeTest, NothingReadNothingToDo) {
-    EXPECT_EQ(worker.applyClientModeChangesToXMLBufferData(), LD_OK);
-    EXPECT_TRUE(worker.layerDataMap.empty());
 }

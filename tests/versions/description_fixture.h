@@ -31,16 +31,8 @@ protected:
         return worker.parseXMLBuffer(description.data(), static_cast<long>(description.size()), hasTicket, nullptr);
     }
 
-    // The layer record of a PDF; fails the test when there is none.
-    XMLLayerData& layers(LD_PDF* pdf) {
-        auto found = worker.layerDataMap.find(pdf);
-        if (found == worker.layerDataMap.end()) {
-            ADD_FAILURE() << "no layer record for that PDF";
-            static XMLLayerData empty;
-            return empty;
-        }
-        return *found->second;
-    }
+    // The layer record of a PDF; throws (failing the test) when there is none.
+    XMLLayerData& layers(LD_PDF* pdf) { return *worker.layerDataMap.at(pdf); }
 
     LD_JDF worker;
     bool hasTicket = false;

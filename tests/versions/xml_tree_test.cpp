@@ -4,7 +4,7 @@
 
 #include <gtest/gtest.h>
 
-#include "test_support.h"
+#include "test_support.h"  // file feeding is checked through ValidDescription
 #include "versions/xml_tree.h"
 
 namespace {
@@ -21,17 +21,12 @@ Parsed parse(const std::string& bytes) {
     return parsed;
 }
 
-std::string nameOf(const _kvXmlNode* node) { return kvXmlBytes(kvXmlName(node)); }
-
 // "name(child child ...)" for a whole subtree, following firstChild / nextSibling only.
 std::string shape(const _kvXmlNode* node) {
-    std::string out = nameOf(node);
+    std::string out = kvXmlBytes(kvXmlName(node));
     if (const _kvXmlNode* child = kvXmlFirstChild(node)) {
         out += '(';
-        for (; child; child = kvXmlNextSibling(child)) {
-            out += shape(child);
-            if (kvXmlNextSibling(child)) out += ' ';
-        }
+        for (; child; child = kvXmlNextSibling(child)) out += shape(child) + (kvXmlNextSibling(child) ? " " : "");
         out += ')';
     }
     return out;
@@ -45,101 +40,60 @@ std::string documentOfLength(size_t length) {
 
 }  // namespace
 
-TEST(XmlTreeShape, SiblingChainsOfCousinsStaySeparate) {
-    Parsed p = parse("<A><B><C/></B><D><E/><F/></D></A>");
-    ASSERT_TRUE(p.ok);
-    EXPECT_EQ(shape(p.root()), "A(B(C) D(E F))");
-    _kvXmlNode* b = kvXmlFirstChild(p.root());
-    _kvXmlNode* c = kvXmlFirstChild(b);
-    EXPECT_EQ(kvXmlNextSibling(c), nullptr);
-    EXPECT_EQ(nameOf(kvXmlFirstChild(kvXmlNextSibling(b))), "E");
-    EXPECT_EQ(c->document, p.document.get());
+TEST(XmlTree, ShapeKeepsOnlyElementsInDocumentOrder) {
+    const std::pair<const char*, const char*> cases[] = {
+        {"<A><B><C/></B><D><E/><F/></D></A>", "A(B(C) D(E F))"},  // cousins' sibling chains stay apart
+        {"<r><a><b><c/><c2/></b></a><a2/><a3><b3><c3/></b3><b4/></a3></r>", "r(a(b(c c2)) a2 a3(b3(c3) b4))"},
+        {"<?xml version='1.0'?><!-- c --><r>text<?pi x?><a/>more<!-- c --><b/></r>", "r(a b)"},
+        {"<x:r xmlns:x='urn:a'><x:c/></x:r>", "x:r(x:c)"},  // prefixes stay
+    };
+    for (auto [xml, expected] : cases) {
+        Parsed p = parse(xml);
+        ASSERT_TRUE(p.ok) << xml;
+        EXPECT_EQ(shape(p.root()), expected);
+    }
+    Parsed empty = parse("");
+    EXPECT_TRUE(empty.ok);
+    EXPECT_EQ(empty.root(), nullptr);
 }
 
-TEST(XmlTreeShape, DeeperLevelsAndReturnsToShallowerOnes) {
-    Parsed p = parse("<r><a><b><c/><c2/></b></a><a2/><a3><b3><c3/></b3><b4/></a3></r>");
-    ASSERT_TRUE(p.ok);
-    EXPECT_EQ(shape(p.root()), "r(a(b(c c2)) a2 a3(b3(c3) b4))");
-}
-
-TEST(XmlTreeShape, TextCommentsAndInstructionsAreDropped) {
-    Parsed p = parse("<?xml version='1.0'?><!-- c --><r>text<?pi x?><a/>more<!-- c --><b/></r>");
-    ASSERT_TRUE(p.ok);
-    EXPECT_EQ(shape(p.root()), "r(a b)");
-}
-
-TEST(XmlTreeShape, EmptyBufferHasNoRoot) {
-    Parsed p = parse("");
-    EXPECT_TRUE(p.ok);
-    EXPECT_EQ(p.root(), nullptr);
-}
-
-TEST(XmlTreeShape, NamesKeepTheirPrefix) {
-    Parsed p = parse("<x:r xmlns:x='urn:a'><x:c/></x:r>");
-    ASSERT_TRUE(p.ok);
-    EXPECT_EQ(shape(p.root()), "x:r(x:c)");
-}
-
-TEST(XmlTreeAttributes, KeepDocumentOrderAndValues) {
-    Parsed p = parse("<r z='1' a='two' m=\"&amp;&#65;\"/>");
+TEST(XmlTree, AttributesKeepOrderAndLookupIgnoresAsciiCase) {
+    Parsed p = parse("<r z='1' Name='two' m=\"&amp;&#65;\" NAME='second'/>");
     ASSERT_TRUE(p.ok);
     std::vector<std::string> seen;
     for (_kvXmlAttribute* a = kvXmlFirstAttribute(p.root()); a; a = kvXmlAttributeNext(a))
         seen.push_back(kvXmlBytes(kvXmlAttributeName(a)) + "=" + kvXmlBytes(kvXmlAttributeValue(a)));
-    EXPECT_EQ(seen, (std::vector<std::string>{"z=1", "a=two", "m=&A"}));
-    EXPECT_EQ(p.root()->lastAttribute, p.root()->firstAttribute->next->next);
-}
-
-TEST(XmlTreeAttributes, LookupIgnoresAsciiCaseAndTakesTheFirst) {
-    Parsed p = parse("<r Name='first' NAME='second'/>");
-    ASSERT_TRUE(p.ok);
-    _kvXmlAttribute* a = kvXmlFindAttribute(p.root(), "name");
-    ASSERT_NE(a, nullptr);
-    EXPECT_EQ(kvXmlBytes(a->value), "first");
+    EXPECT_EQ(seen, (std::vector<std::string>{"z=1", "Name=two", "m=&A", "NAME=second"}));
+    EXPECT_EQ(p.root()->lastAttribute->next, nullptr);
+    EXPECT_EQ(kvXmlBytes(p.root()->lastAttribute->value), "second");
+    _kvXmlAttribute* found = kvXmlFindAttribute(p.root(), "name");
+    ASSERT_NE(found, nullptr);
+    EXPECT_EQ(kvXmlBytes(found->value), "two");  // the first of two spellings
     EXPECT_EQ(kvXmlFindAttribute(p.root(), "nam"), nullptr);
 }
 
-TEST(XmlTreeAttributes, RepeatedAttributeIsAParseError) {
-    Parsed p = parse("<r a='1' a='2'/>");
-    EXPECT_FALSE(p.ok);
-}
-
-TEST(XmlTreeText, OneUnitPerUtf8Byte) {
-    Parsed p = parse("<r v='\xC3\x84\xE2\x82\xAC'/>");  // A-umlaut, euro sign
+TEST(XmlTree, TextIsOneUnitPerUtf8Byte) {
+    Parsed p = parse("<r v='\xC3\x84\xE2\x82\xAC' e=''/>");  // A-umlaut, euro sign
     ASSERT_TRUE(p.ok);
     _kvXmlText* value = p.root()->firstAttribute->value;
     ASSERT_EQ(value->length, 5);
-    EXPECT_EQ(value->text[0], 0xC3);
-    EXPECT_EQ(value->text[4], 0xAC);
     EXPECT_EQ(value->text[5], 0);
-    // The UTF-8 copy gives the original bytes back.
     char* copy = kvXmlUtf8Copy(value);
     EXPECT_STREQ(copy, "\xC3\x84\xE2\x82\xAC");
     kvXmlFreeUtf8Copy(copy);
-}
-
-TEST(XmlTreeText, EmptyTextCopiesToTheSharedEmptyString) {
-    Parsed p = parse("<r v=''/>");
-    ASSERT_TRUE(p.ok);
-    char* copy = kvXmlUtf8Copy(p.root()->firstAttribute->value);
-    EXPECT_EQ(copy, kvXmlEmptyText);
-    kvXmlFreeUtf8Copy(copy);  // must not free the shared string
+    char* empty = kvXmlUtf8Copy(p.root()->lastAttribute->value);
+    EXPECT_EQ(empty, kvXmlEmptyText);
+    kvXmlFreeUtf8Copy(empty);  // must not free the shared string
     EXPECT_EQ(kvXmlUtf8Copy(nullptr), kvXmlEmptyText);
-}
-
-TEST(XmlTreeText, DeclaredLatin1ArrivesAsUtf8Bytes) {
-    Parsed p = parse("<?xml version='1.0' encoding='ISO-8859-1'?><r v='\xC4'/>");
-    ASSERT_TRUE(p.ok);
-    EXPECT_EQ(kvXmlBytes(p.root()->firstAttribute->value), "\xC3\x84");
-}
-
-TEST(XmlTreeText, NameComparisonFoldsOnlyAscii) {
-    Parsed p = parse("<OptionalContentGroupData/>");
-    ASSERT_TRUE(p.ok);
-    EXPECT_TRUE(kvXmlTextEquals(p.root()->name, "optionalcontentgroupdata"));
-    EXPECT_FALSE(kvXmlTextEquals(p.root()->name, "OptionalContentGroupDat"));
-    Parsed q = parse("<r v='\xC3\xA4'/>");  // a-umlaut must not match A-umlaut
-    EXPECT_FALSE(kvXmlTextEquals(q.root()->firstAttribute->value, "\xC3\x84"));
+    // A declared Latin-1 document arrives as UTF-8 bytes.
+    Parsed latin = parse("<?xml version='1.0' encoding='ISO-8859-1'?><r v='\xC4'/>");
+    ASSERT_TRUE(latin.ok);
+    EXPECT_EQ(kvXmlBytes(latin.root()->firstAttribute->value), "\xC3\x84");
+    // Name comparison folds only ASCII: a-umlaut does not match A-umlaut.
+    EXPECT_FALSE(kvXmlTextEquals(p.root()->firstAttribute->value, "\xC3\xA4\xE2\x82\xAC"));
+    Parsed named = parse("<OptionalContentGroupData/>");
+    EXPECT_TRUE(kvXmlTextEquals(named.root()->name, "optionalcontentgroupdata"));
+    EXPECT_FALSE(kvXmlTextEquals(named.root()->name, "OptionalContentGroupDat"));
 }
 
 // Pieces of 512 bytes: whatever the boundaries cut (names, attribute values, tags), the tree is
@@ -151,109 +105,60 @@ TEST(XmlTreeChunking, BoundariesDoNotChangeTheTree) {
         EXPECT_EQ(shape(p.root()), "a(b c(d))") << length;
         EXPECT_EQ(p.root()->firstAttribute->value->length, static_cast<int32_t>(length - kFixedBytes)) << length;
     }
-}
-
-TEST(XmlTreeChunking, ElementNameAcrossABoundary) {
-    std::string doc = "<r>" + std::string(505, ' ') + "<LongElementName/></r>";  // name spans 512
-    Parsed p = parse(doc);
-    ASSERT_TRUE(p.ok);
+    Parsed p = parse("<r>" + std::string(505, ' ') + "<LongElementName/></r>");  // name spans 512
     EXPECT_EQ(shape(p.root()), "r(LongElementName)");
+    std::string unclosed = "<r p='" + std::string(1024 - 12, 'v') + "'><a/>";
+    ASSERT_EQ(unclosed.size(), 1024u);
+    EXPECT_FALSE(parse(unclosed).ok);
 }
 
-TEST(XmlTreeChunking, TruncatedDocumentOfExactMultipleLengthIsAnError) {
-    std::string doc = "<r p='" + std::string(1024 - 12, 'v') + "'><a/>";  // root never closed
-    ASSERT_EQ(doc.size(), 1024u);
-    EXPECT_FALSE(parse(doc).ok);
-    std::string shorter = doc.substr(0, 1000);
-    EXPECT_FALSE(parse(shorter + "'>").ok);
-}
-
-TEST(XmlTreeChunking, PieceByPieceWithFinalFlag) {
+TEST(XmlTreeChunking, PiecesWithFinalFlagAndFeedsAfterAnError) {
     KvXmlDocumentPtr document(kvXmlCreateDocument());
     EXPECT_TRUE(kvXmlFeedPiece(document.get(), "<r><a", 5, false));
     EXPECT_TRUE(kvXmlFeedPiece(document.get(), "/></r>", 6, true));
     EXPECT_EQ(shape(kvXmlRoot(document.get())), "r(a)");
+    KvXmlDocumentPtr bad(kvXmlCreateDocument());
+    EXPECT_FALSE(kvXmlFeedPiece(bad.get(), "<r><a></r>", 10, true));
+    EXPECT_STRNE(kvXmlErrorText(bad.get()), "");
+    EXPECT_FALSE(kvXmlFeedPiece(bad.get(), "<r/>", 4, true));
 }
 
-TEST(XmlTreeBadInput, MalformedAndFollowingFeedsFail) {
-    KvXmlDocumentPtr document(kvXmlCreateDocument());
-    EXPECT_FALSE(kvXmlFeedPiece(document.get(), "<r><a></r>", 10, true));
-    EXPECT_STRNE(kvXmlErrorText(document.get()), "");
-    EXPECT_FALSE(kvXmlFeedPiece(document.get(), "<r/>", 4, true));
+TEST(XmlTreeBadInput, MalformedDocumentsAreRejected) {
+    for (const std::string& xml : {std::string("<r a='1' a='2'/>"), std::string("<a/><b/>"),
+                                   std::string("<r v='\xFF\xFE'/>"), std::string("<r\xC3/>"), std::string("<r>\0</r>", 8)})
+        EXPECT_FALSE(parse(xml).ok) << xml;
 }
-
-TEST(XmlTreeBadInput, InvalidUtf8IsRejected) {
-    EXPECT_FALSE(parse("<r v='\xFF\xFE'/>").ok);
-    EXPECT_FALSE(parse("<r\xC3/>").ok);
-    EXPECT_FALSE(parse(std::string("<r>\0</r>", 8)).ok);
-}
-
-TEST(XmlTreeBadInput, SecondRootIsRejected) { EXPECT_FALSE(parse("<a/><b/>").ok); }
 
 TEST(XmlTreeBadInput, EntityExpansionBombIsStoppedQuickly) {
     std::string bomb = "<?xml version='1.0'?><!DOCTYPE r [<!ENTITY l0 'haha'>";
-    for (int i = 1; i <= 12; ++i)
-        bomb += "<!ENTITY l" + std::to_string(i) + " '" + [&] {
-            std::string refs;
-            for (int k = 0; k < 10; ++k) refs += "&l" + std::to_string(i - 1) + ";";
-            return refs;
-        }() + "'>";
-    bomb += "]><r v='&l12;'/>";
-    EXPECT_FALSE(parse(bomb).ok);  // expat's amplification limit, not memory exhaustion
+    for (int i = 1; i <= 12; ++i) {
+        bomb += "<!ENTITY l" + std::to_string(i) + " '";
+        for (int k = 0; k < 10; ++k) bomb += "&l" + std::to_string(i - 1) + ";";
+        bomb += "'>";
+    }
+    EXPECT_FALSE(parse(bomb + "]><r v='&l12;'/>").ok);  // expat's amplification limit, not memory exhaustion
 }
 
 TEST(XmlTreeBadInput, ExternalEntitiesAreNotLoaded) {
     vorlan::test::TempDir dir;
     vorlan::test::writeFile(dir / "secret.txt", "secret");
-    std::string doc = "<!DOCTYPE r [<!ENTITY e SYSTEM '" + (dir / "secret.txt").string() + "'>]><r>&e;<a v='x'/></r>";
-    Parsed p = parse(doc);
-    // Either way the external file's content never reaches the tree.
+    Parsed p = parse("<!DOCTYPE r [<!ENTITY e SYSTEM '" + (dir / "secret.txt").string() + "'>]><r>&e;<a v='x'/></r>");
     if (p.ok) {
-        EXPECT_EQ(shape(p.root()), "r(a)");
+        EXPECT_EQ(shape(p.root()), "r(a)");  // either way the file's content never arrives
     }
 }
 
-TEST(XmlTreeBadInput, DeepNestingBuildsAndReleases) {
+TEST(XmlTreeBadInput, DeepNestingAndHugeValues) {
     const int depth = 200000;
     std::string doc;
     for (int i = 0; i < depth; ++i) doc += "<e>";
     for (int i = 0; i < depth; ++i) doc += "</e>";
-    Parsed p = parse(doc);
-    ASSERT_TRUE(p.ok);
+    Parsed deep = parse(doc);
+    ASSERT_TRUE(deep.ok);
     int levels = 0;
-    for (const _kvXmlNode* n = p.root(); n; n = kvXmlFirstChild(n)) ++levels;
+    for (const _kvXmlNode* n = deep.root(); n; n = kvXmlFirstChild(n)) ++levels;
     EXPECT_EQ(levels, depth);
-}
-
-TEST(XmlTreeBadInput, HugeAttributeValue) {
-    std::string value(8 * 1024 * 1024, 'x');
-    Parsed p = parse("<r v='" + value + "'/>");
-    ASSERT_TRUE(p.ok);
-    EXPECT_EQ(p.root()->firstAttribute->value->length, static_cast<int32_t>(value.size()));
-}
-
-TEST(XmlTreeFile, ReadsIn512BytePiecesAndFinishes) {
-    vorlan::test::TempDir dir;
-    for (size_t length : {100u, 512u, 1024u, 1500u}) {
-        std::string doc = documentOfLength(length);
-        vorlan::test::writeFile(dir / "ok.xml", doc);
-        KvXmlDocumentPtr document(kvXmlCreateDocument());
-        ASSERT_TRUE(kvXmlFeedFile(document.get(), (dir / "ok.xml").c_str())) << length;
-        EXPECT_EQ(shape(kvXmlRoot(document.get())), "a(b c(d))");
-        // The same bytes without the closing tag, padded back to the same length.
-        std::string truncated = doc.substr(0, doc.size() - 4) + "    ";
-        vorlan::test::writeFile(dir / "cut.xml", truncated);
-        KvXmlDocumentPtr cut(kvXmlCreateDocument());
-        EXPECT_FALSE(kvXmlFeedFile(cut.get(), (dir / "cut.xml").c_str())) << length;
-    }
-}
-
-TEST(XmlTreeFile, MissingFileAndFolderFail) {
-    vorlan::test::TempDir dir;
-    KvXmlDocumentPtr a(kvXmlCreateDocument());
-    EXPECT_FALSE(kvXmlFeedFile(a.get(), (dir / "absent.xml").c_str()));
-    KvXmlDocumentPtr b(kvXmlCreateDocument());
-    EXPECT_FALSE(kvXmlFeedFile(b.get(), dir.path().c_str()));
-    KvXmlDocumentPtr c(kvXmlCreateDocument());
-    EXPECT_FALSE(kvXmlFeedFile(c.get(), nullptr));
+    Parsed huge = parse("<r v='" + std::string(8 << 20, 'x') + "'/>");
+    ASSERT_TRUE(huge.ok);
+    EXPECT_EQ(huge.root()->firstAttribute->value->length, 8 << 20);
 }
