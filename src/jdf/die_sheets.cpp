@@ -28,16 +28,30 @@ LD_Surface* dieSurface(const LD_Surface& surface, ContentType type, bool keepVer
     return made;
 }
 
+// What an appended die sheet copies: the content surface, its sheet and the last signature that
+// receives the copy. All null (and the last error set) when any of them is missing.
+struct DieSheetSource {
+    LD_Surface* surface;
+    LD_Sheet* sheet;
+    LD_Signature* last;
+};
+
+DieSheetSource dieSheetSource(LD_JDF& w, int32_t surfaceIndex) {
+    LD_Surface* surface = w.getSurfaceByIndex(surfaceIndex);
+    LD_Sheet* sheet = surface ? w.getSheetByIndex(surface->sheetIndex) : nullptr;
+    LD_Signature* last = w.getSignatureByIndex(static_cast<int32_t>(w.signatures.size()) - 1);
+    if (!surface || !sheet || !last) {
+        w.lastError = LD_FAILED;
+        return {nullptr, nullptr, nullptr};
+    }
+    return {surface, sheet, last};
+}
+
 }  // namespace
 
 LD_Sheet* LD_JDF::appendDieSheetInLayout(int32_t surfaceIndex, ContentType type) {
-    LD_Surface* surface = getSurfaceByIndex(surfaceIndex);
-    LD_Sheet* sheet = surface ? getSheetByIndex(surface->sheetIndex) : nullptr;
-    LD_Signature* last = getSignatureByIndex(static_cast<int32_t>(signatures.size()) - 1);
-    if (!surface || !sheet || !last) {
-        lastError = LD_FAILED;
-        return nullptr;
-    }
+    auto [surface, sheet, last] = dieSheetSource(*this, surfaceIndex);
+    if (!surface) return nullptr;
     LD_Sheet* made = newDieSheet(*sheet);
     if (sheet->front && sheet->back) {  // a two-sided sheet gives a two-sided die sheet
         made->front = dieSurface(*sheet->front, type);
@@ -68,13 +82,8 @@ LD_Sheet* LD_JDF::appendDieSheetInLayout(int32_t surfaceIndex, ContentType type)
 }
 
 LD_Surface* LD_JDF::appendDieSheetAndSurfaceInLayout(int32_t surfaceIndex) {
-    LD_Surface* surface = getSurfaceByIndex(surfaceIndex);
-    LD_Sheet* sheet = surface ? getSheetByIndex(surface->sheetIndex) : nullptr;
-    LD_Signature* last = getSignatureByIndex(static_cast<int32_t>(signatures.size()) - 1);
-    if (!surface || !sheet || !last) {
-        lastError = LD_FAILED;
-        return nullptr;
-    }
+    auto [surface, sheet, last] = dieSheetSource(*this, surfaceIndex);
+    if (!surface) return nullptr;
     LD_Sheet* made = newDieSheet(*sheet);
     made->front = dieSurface(*surface, CONTENT_DIE_ONLY, true);
     made->front->isFront = true;

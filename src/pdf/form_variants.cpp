@@ -33,4 +33,20 @@ void FormVariants::finish() {
     entries_.clear();
 }
 
+void FormVariants::editUse(const ContentElement& e, ContentEditor& parent,
+                           const std::function<void(Content&, ContentEditor&)>& edit) {
+    QPDFObjectHandle form = e.object;  // a handle copy: qpdf's accessors are not const
+    if (!e.form || !form.isStream() || (!e.form->complete && e.form->bytes.empty())) return;
+    QPDFObjectHandle& target = targets_[e.form.get()];
+    if (!target.isInitialized()) {
+        Content& content = *e.form;
+        ContentEditor editor(content);
+        edit(content, editor);
+        std::string bytes = editor.edited() ? editor.result() : content.bytes;
+        target = objectFor(form, content.bytes, std::move(bytes));
+    }
+    if (!target.isSameObjectAs(form))
+        parent.replace(e.begin, e.opBegin, parent.resourceName("/XObject", target, "Fm") + " ");
+}
+
 }  // namespace vorlan::pdf

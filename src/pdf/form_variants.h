@@ -9,8 +9,11 @@
 #include <qpdf/QPDF.hh>
 #include <qpdf/QPDFObjectHandle.hh>
 
+#include <functional>
 #include <map>
 #include <string>
+
+#include "pdf/content_edit.h"
 
 namespace vorlan::pdf {
 
@@ -22,6 +25,12 @@ public:
     // the form itself when the bytes are its first variant (or the first variant is claimed
     // now), else a copy with these bytes.
     QPDFObjectHandle objectFor(QPDFObjectHandle form, const std::string& original, std::string bytes);
+
+    // For the use `e` of a form inside the content `parent` edits: edits the parsed form once
+    // (`edit` walks it into the editor it is given), however many uses share that parsing, and
+    // points this use at the variant that carries the result.
+    void editUse(const ContentElement& e, ContentEditor& parent,
+                 const std::function<void(Content&, ContentEditor&)>& edit);
 
     // Writes the claimed variants into the original forms (unfiltered; the writer compresses them).
     void finish();
@@ -35,6 +44,7 @@ private:
     };
     QPDF& pdf_;
     std::map<QPDFObjGen, Entry> entries_;
+    std::map<const Content*, QPDFObjectHandle> targets_;  // what each parsed form became
 };
 
 }  // namespace vorlan::pdf

@@ -118,18 +118,7 @@ private:
     }
 
     void convertForm(const ContentElement& e, ContentEditor& parent) {
-        QPDFObjectHandle object = e.object;  // a handle copy: qpdf's accessors are not const
-        if (!e.form || !object.isStream() || (!e.form->complete && e.form->bytes.empty())) return;
-        QPDFObjectHandle& target = formTargets_[e.form.get()];
-        if (!target.isInitialized()) {  // each parsed form is converted once, whatever its uses
-            Content& form = *e.form;
-            ContentEditor editor(form);
-            walk(form, form.elements, editor);
-            std::string bytes = editor.edited() ? editor.result() : form.bytes;
-            target = variants_.objectFor(object, form.bytes, std::move(bytes));
-        }
-        if (!target.isSameObjectAs(object))
-            parent.replace(e.begin, e.opBegin, parent.resourceName("/XObject", target, "Fm") + " ");
+        variants_.editUse(e, parent, [&](Content& form, ContentEditor& editor) { walk(form, form.elements, editor); });
     }
 
     static bool underOptionalContent(const ContentElement& e) {
@@ -206,7 +195,6 @@ private:
     std::vector<std::string> table_;
     ColourSpaceResolver::SharedCache cache_;
     FormCache forms_;                                   // parsed forms, shared between uses
-    std::map<const Content*, QPDFObjectHandle> formTargets_;  // what each parsed form became
 };
 
 }  // namespace

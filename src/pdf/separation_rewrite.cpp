@@ -332,18 +332,8 @@ private:
     }
 
     void rewriteForm(const ContentElement& e, ContentEditor& parent) {
-        QPDFObjectHandle form = e.object;
-        if (!e.form || !form.isStream() || (!e.form->complete && e.form->bytes.empty())) return;
-        QPDFObjectHandle& target = formTargets_[e.form.get()];
-        if (!target.isInitialized()) {  // each parsed form is rewritten once, whatever its uses
-            Content& content = *e.form;
-            ContentEditor editor(content);
-            rewrite(content, content.elements, editor);
-            std::string bytes = editor.edited() ? editor.result() : content.bytes;
-            target = variants_.objectFor(form, content.bytes, std::move(bytes));
-        }
-        if (!target.isSameObjectAs(form))
-            parent.replace(e.begin, e.opBegin, parent.resourceName("/XObject", target, "Fm") + " ");
+        variants_.editUse(e, parent,
+                          [&](Content& content, ContentEditor& editor) { rewrite(content, content.elements, editor); });
     }
 
     // Appearance streams are drawn from the initial state, like a form used at the page's start.
@@ -386,7 +376,6 @@ private:
     FormVariants variants_;
     ColourSpaceResolver::SharedCache cache_;
     FormCache forms_;                                   // parsed forms, shared between uses
-    std::map<const Content*, QPDFObjectHandle> formTargets_;  // what each parsed form became
     std::map<std::string, QPDFObjectHandle> replacements_;
     std::map<const ColourSpace*, std::pair<ColourSpaceRef, QPDFObjectHandle>> bySpace_;
     std::map<int, QPDFObjectHandle> nothing_;

@@ -1,6 +1,7 @@
 // JDFParser: reads a JDF (or any XML) file into a document.
 #pragma once
 
+#include <functional>
 #include <string>
 
 #include "platform/jdf/jdf_doc.h"
@@ -32,6 +33,8 @@ public:
     const std::string& GetError() const { return error_; }
 
 private:
+    bool adopt(const std::function<pugi::xml_parse_result(pugi::xml_document&)>& load);
+
     XMLDoc doc_;
     std::string error_;
 };
