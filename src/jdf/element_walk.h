@@ -9,6 +9,8 @@
 
 #include <pugixml.hpp>
 
+#include "platform/jdf/node_walk.h"
+
 namespace vorlan::jdf {
 
 // The name after the prefix ("Layout" of "jdf:Layout").
@@ -18,24 +20,6 @@ inline const char* localName(pugi::xml_node n) {
     return colon ? colon + 1 : qualified;
 }
 
-// Calls visit(element) for every element below top (top itself excluded), in document order,
-// until visit returns false.
-template <typename Visit>
-void forEachElementBelow(pugi::xml_node top, Visit visit) {
-    if (!top) return;
-    pugi::xml_node n = top.first_child();
-    while (n) {
-        if (n.type() == pugi::node_element) {
-            if (!visit(n)) return;
-            if (n.first_child()) {
-                n = n.first_child();
-                continue;
-            }
-        }
-        while (n != top && !n.next_sibling()) n = n.parent();
-        if (n == top) return;
-        n = n.next_sibling();
-    }
-}
+using JDF::forEachElementBelow;
 
 }  // namespace vorlan::jdf

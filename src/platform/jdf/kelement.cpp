@@ -6,6 +6,8 @@
 #include <set>
 #include <string>
 
+#include "platform/jdf/node_walk.h"
+
 namespace JDF {
 namespace {
 
@@ -45,24 +47,16 @@ bool lookupNamespace(pugi::xml_node n, const std::string& prefix, std::string& u
 }
 
 void collectPrefixes(pugi::xml_node top, std::set<std::string>& out) {
-    // Iterative walk of the subtree: documents may nest deeper than the stack allows.
-    pugi::xml_node n = top;
-    while (n) {
-        if (n.type() == pugi::node_element) {
-            out.insert(prefixOf(n.name()));
-            for (pugi::xml_attribute a = n.first_attribute(); a; a = a.next_attribute()) {
-                std::string p = prefixOf(a.name());
-                if (!p.empty() && p != "xmlns") out.insert(p);
-            }
-            if (n.first_child()) {
-                n = n.first_child();
-                continue;
-            }
+    auto collect = [&](pugi::xml_node n) {
+        out.insert(prefixOf(n.name()));
+        for (pugi::xml_attribute a = n.first_attribute(); a; a = a.next_attribute()) {
+            std::string p = prefixOf(a.name());
+            if (!p.empty() && p != "xmlns") out.insert(p);
         }
-        while (n != top && !n.next_sibling()) n = n.parent();
-        if (n == top) break;
-        n = n.next_sibling();
-    }
+        return true;
+    };
+    if (top.type() == pugi::node_element) collect(top);
+    forEachElementBelow(top, collect);
 }
 
 // Finds the attribute for key (and optional namespace) on n.
@@ -244,21 +238,15 @@ KElement KElement::GetChildByTagName(const WString& name, const WString& ns, int
     if (!node_ || index < 0) return {};
     int seen = 0;
     Matcher match(name, ns, mAttrib, !bAnyAttr);
-    pugi::xml_node n = node_.first_child();
-    while (n) {
-        if (n.type() == pugi::node_element) {
-            if (match(n) && seen++ == index) return wrap(n);
-            if (!bDirect && n.first_child()) {
-                n = n.first_child();
-                continue;
-            }
-        }
-        // Next node in document order, staying below node_.
-        while (n && !n.next_sibling() && n != node_) n = n.parent();
-        if (!n || n == node_) break;
-        n = n.next_sibling();
-    }
-    return {};
+    pugi::xml_node found;
+    forEachElementBelow(
+        node_,
+        [&](pugi::xml_node n) {
+            if (match(n) && seen++ == index) found = n;
+            return !found;
+        },
+        bDirect);
+    return found ? wrap(found) : KElement();
 }
 
 vElement KElement::GetChildrenByTagName(const WString& name, const WString& ns, const JDFAttributeMap& mAttrib,
@@ -266,22 +254,13 @@ vElement KElement::GetChildrenByTagName(const WString& name, const WString& ns, 
     vElement out;
     if (!node_) return out;
     Matcher match(name, ns, mAttrib, bAnd);
-    pugi::xml_node n = node_.first_child();
-    while (n) {
-        if (n.type() == pugi::node_element) {
-            if (match(n)) {
-                out.push_back(wrap(n));
-                if (maxSize > 0 && static_cast<int>(out.size()) >= maxSize) break;
-            }
-            if (!bDirect && n.first_child()) {
-                n = n.first_child();
-                continue;
-            }
-        }
-        while (n && !n.next_sibling() && n != node_) n = n.parent();
-        if (!n || n == node_) break;
-        n = n.next_sibling();
-    }
+    forEachElementBelow(
+        node_,
+        [&](pugi::xml_node n) {
+            if (match(n)) out.push_back(wrap(n));
+            return maxSize <= 0 || static_cast<int>(out.size()) < maxSize;
+        },
+        bDirect);
     return out;
 }
 
