@@ -3,6 +3,7 @@
 #include <climits>
 #include <cstdint>
 
+#include "jdf/page_selection.h"
 #include "platform/jdf/jdf.h"
 #include "vorlan/LD_JDF.h"
 
@@ -108,12 +109,17 @@ void LD_JDF::applyPageRangeForPDF() {
 }
 
 void LD_JDF::applyPageRangeForPDFWithoutVersions() {
-    size_t first = pageSelection.size();
-    size_t count = surfaceVersions.size();
-    pageSelection.resize(first + count, false);
+    std::vector<bool> selected = selectPositions(*this, surfaceVersions.size());
+    pageSelection.insert(pageSelection.end(), selected.begin(), selected.end());
+}
+
+std::vector<bool> selectPositions(LD_JDF& w, size_t count) {
+    std::vector<bool> selected(count, false);
     std::vector<int32_t> listed;
-    if (pageRangeMode == kList) ConvertPageRangesToPages(listed, count > INT32_MAX ? INT32_MAX : static_cast<int32_t>(count));
-    selectStretch(pageSelection, first, count, pageRangeMode, listed);
+    if (w.pageRangeMode == kList)
+        w.ConvertPageRangesToPages(listed, count > INT32_MAX ? INT32_MAX : static_cast<int32_t>(count));
+    selectStretch(selected, 0, count, w.pageRangeMode, listed);
+    return selected;
 }
 
 LDError LD_JDF::convertPagesVecToJDFRangeList(std::vector<int32_t>& pages, JDF::JDFIntegerRangeList& ranges) {

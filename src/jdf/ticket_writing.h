@@ -4,6 +4,8 @@
 // back a null element, so the first failure ends the write before anything is saved.
 #pragma once
 
+#include <functional>
+
 #include "platform/jdf/jdf.h"
 #include "vorlan/LD_JDF.h"
 
@@ -22,6 +24,13 @@ Element need(Element element) {
     return element;
 }
 
+// The Run partition of one ordinal. Each is made once, in ordinal order, so it can be appended
+// outright (the element GetCreatePartition would make, without searching the ones made so far).
+template <typename Resource>
+Resource runPartition(Resource& resource, int32_t ordinal) {
+    return need(Resource(resource.AddPartition(20, JDF::WString::valueOf(ordinal))));
+}
+
 // The KAV_tkt:VersContentType text of a content type; null for a value that has none.
 const wchar_t* contentTypeText(ContentType type);
 
@@ -33,6 +42,21 @@ void setVersionTags(JDF::KElement& element, const wchar_t* name, int32_t index, 
 
 // The file URL of a PDF: of its converted copy when there is one, else of the file itself.
 JDF::WString pdfURL(LD_JDF& worker, LD_PDF* pdf);
+
+// The root of a new ticket as one Combined node: activation, status, Type, Types, the extension
+// namespaces, RenderingParams (Interleaved) and DigitalPrintingParams.
+JDF::JDFNode startCombinedNode(JDF::JDFDoc& doc, const wchar_t* types);
+
+// Builds a new ticket with `build` and saves it atomically to outputPath. LD_JDF_WRITE_FAILED when
+// building throws (WriteFailure, a JDF layer exception, out of memory) or the save fails: nothing
+// new is then left at the path. Otherwise the result of `build` (the ticket is saved only when it
+// is LD_OK). Sets the worker's last error.
+LDError writeTicket(LD_JDF& worker, const char* outputPath, const std::function<LDError(JDF::JDFDoc&)>& build);
+
+// The ordinal-table row with ordinal k (at position k unless rows were moved); null when none.
+LD_OrdinalTableElement* rowOf(LD_JDF& worker, int32_t k);
+// Pages = the one page.
+void setSinglePage(JDF::JDFRunList& part, int32_t page);
 
 // The Layout resource rebuilt from the model; false when the model has no signature.
 bool writeLayout(LD_JDF& worker, JDF::JDFNode& root);

@@ -38,6 +38,40 @@ JDF::WString pdfURL(LD_JDF& worker, LD_PDF* pdf) {
     return text;
 }
 
+JDF::JDFNode startCombinedNode(JDF::JDFDoc& doc, const wchar_t* types) {
+    JDF::JDFNode root = need(JDF::JDFNode(doc.GetRoot()));
+    root.SetActivation(6);
+    root.SetStatus(3);
+    root.SetType(L"Combined");
+    root.SetTypes(JDF::vWString(types));
+    root.SetAttribute(L"xmlns:KAV_tkt", kTicketExtensionNs);
+    root.SetAttribute(L"xmlns:ADBE", kAdobeExtensionNs);
+
+    JDF::JDFRenderingParams rendering = need(root.AppendMatchingResource(L"RenderingParams", 1));
+    rendering.SetInterleaved(true);
+    rendering.SetStatus(7);
+    need(root.AppendMatchingResource(L"DigitalPrintingParams", 1)).SetStatus(7);
+    return root;
+}
+
+LDError writeTicket(LD_JDF& w, const char* outputPath, const std::function<LDError(JDF::JDFDoc&)>& build) {
+    LDError result;
+    try {
+        JDF::JDFDoc doc(0);
+        result = build(doc);
+        if (result == LD_OK && (!outputPath || !doc.Write2File(JDF::WString(vorlan::os::widen(outputPath)))))
+            result = LD_JDF_WRITE_FAILED;
+    } catch (const WriteFailure&) {
+        result = LD_JDF_WRITE_FAILED;
+    } catch (const JDF::JDFException&) {
+        result = LD_JDF_WRITE_FAILED;
+    } catch (const std::bad_alloc&) {
+        result = LD_JDF_WRITE_FAILED;
+    }
+    w.lastError = result;
+    return result;
+}
+
 }  // namespace vorlan::jdf
 
 namespace {
@@ -47,18 +81,7 @@ using namespace vorlan::jdf;
 // Builds the whole document; throws WriteFailure (or a JDF layer exception) on the first failure.
 // Returns LD_FAILED when the output component cannot be made.
 LDError buildTicket(LD_JDF& w, JDF::JDFDoc& doc) {
-    JDF::JDFNode root = need(JDF::JDFNode(doc.GetRoot()));
-    root.SetActivation(6);
-    root.SetStatus(3);
-    root.SetType(L"Combined");
-    root.SetTypes(JDF::vWString(L"Imposition Interpreting DigitalPrinting Rendering"));
-    root.SetAttribute(L"xmlns:KAV_tkt", kTicketExtensionNs);
-    root.SetAttribute(L"xmlns:ADBE", kAdobeExtensionNs);
-
-    JDF::JDFRenderingParams rendering = need(root.AppendMatchingResource(L"RenderingParams", 1));
-    rendering.SetInterleaved(true);
-    rendering.SetStatus(7);
-    need(root.AppendMatchingResource(L"DigitalPrintingParams", 1)).SetStatus(7);
+    JDF::JDFNode root = startCombinedNode(doc, L"Imposition Interpreting DigitalPrinting Rendering");
 
     bool layout = writeLayout(w, root);
     bool interpreting = writeInterpretingParams(w, root);
@@ -80,19 +103,5 @@ LDError buildTicket(LD_JDF& w, JDF::JDFDoc& doc) {
 }  // namespace
 
 LDError LD_JDF::writeJDF(char* outputPath) {
-    LDError result;
-    try {
-        JDF::JDFDoc doc(0);
-        result = buildTicket(*this, doc);
-        if (result == LD_OK && (!outputPath || !doc.Write2File(JDF::WString(vorlan::os::widen(outputPath)))))
-            result = LD_JDF_WRITE_FAILED;
-    } catch (const WriteFailure&) {
-        result = LD_JDF_WRITE_FAILED;
-    } catch (const JDF::JDFException&) {
-        result = LD_JDF_WRITE_FAILED;
-    } catch (const std::bad_alloc&) {
-        result = LD_JDF_WRITE_FAILED;
-    }
-    lastError = result;
-    return result;
+    return writeTicket(*this, outputPath, [this](JDF::JDFDoc& doc) { return buildTicket(*this, doc); });
 }

@@ -13,13 +13,6 @@ namespace {
 
 using namespace vorlan::jdf;
 
-// Each ordinal partition is made once, in ordinal order, so it can be appended outright (the
-// same element GetCreatePartition would make, without searching the partitions made so far).
-template <typename Resource>
-Resource runPartition(Resource& resource, int32_t ordinal) {
-    return need(Resource(resource.AddPartition(20, JDF::WString::valueOf(ordinal))));
-}
-
 void writeSwitches(JDF::JDFPDFInterpretingParams pdf, const LD_OCG_InterpretingParams* params) {
     pdf.SetOCGDefault(2);
     pdf.SetOCGIntent(params && params->OCGIntent && *params->OCGIntent ? params->OCGIntent : L"View");
@@ -36,24 +29,10 @@ void writeSwitches(JDF::JDFPDFInterpretingParams pdf, const LD_OCG_InterpretingP
     }
 }
 
-void setSinglePage(JDF::JDFRunList& part, int32_t page) {
-    JDF::JDFIntegerRangeList pages;
-    pages.Append(page);
-    part.SetPages(pages);
-}
-
 void writeFileSpec(LD_JDF& w, JDF::JDFLayoutElement& element, LD_PDF* pdf) {
     JDF::JDFFileSpec fileSpec = need(element.GetCreateFileSpec());
     fileSpec.SetURL(pdfURL(w, pdf));
     fileSpec.SetMimeType(pdf->mimeType);
-}
-
-// The row with ordinal k: at position k unless rows were moved.
-LD_OrdinalTableElement* rowOf(LD_JDF& w, int32_t k) {
-    auto& table = w.m_OrdinalTable;
-    if (static_cast<size_t>(k) < table.size() && table[static_cast<size_t>(k)] && table[static_cast<size_t>(k)]->ordinal == k)
-        return table[static_cast<size_t>(k)];
-    return w.getOrdinalElementByOrdNum(k);
 }
 
 int32_t tableSize(const LD_JDF& w) { return static_cast<int32_t>(w.m_OrdinalTable.size()); }
@@ -61,6 +40,19 @@ int32_t tableSize(const LD_JDF& w) { return static_cast<int32_t>(w.m_OrdinalTabl
 }  // namespace
 
 namespace vorlan::jdf {
+
+void setSinglePage(JDF::JDFRunList& part, int32_t page) {
+    JDF::JDFIntegerRangeList pages;
+    pages.Append(page);
+    part.SetPages(pages);
+}
+
+LD_OrdinalTableElement* rowOf(LD_JDF& w, int32_t k) {
+    auto& table = w.m_OrdinalTable;
+    if (static_cast<size_t>(k) < table.size() && table[static_cast<size_t>(k)] && table[static_cast<size_t>(k)]->ordinal == k)
+        return table[static_cast<size_t>(k)];
+    return w.getOrdinalElementByOrdNum(k);
+}
 
 bool writeInterpretingParams(LD_JDF& w, JDF::JDFNode& root) {
     if (w.m_OrdinalTable.empty()) return false;

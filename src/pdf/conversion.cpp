@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "entry/host_paths.h"
 #include "pdf/separation_layers.h"
 #include "platform/os/text.h"
 #include "vorlan/LD_JDF.h"
@@ -53,10 +54,8 @@ void LD_JDF::getListOfSeparationsToBeConverted(std::vector<wchar_t*>& names) {
 LDError LD_JDF::convertAllPDFs() {
     for (auto& [pdf, layers] : layerDataMap) {
         if (!pdf) continue;
-        char buffer[2048] = {};
-        if (FilePathCallback) FilePathCallback(buffer, static_cast<int>(sizeof buffer), userData);
-        buffer[sizeof buffer - 1] = '\0';
-        wchar_t* converted = getWCharFromChar(buffer);
+        const std::string buffer = askHostForFilePath(*this);
+        wchar_t* converted = getWCharFromChar(buffer.c_str());
         if (!converted) converted = static_cast<wchar_t*>(std::calloc(1, sizeof(wchar_t)));
         std::free(pdf->convertedPath);
         pdf->convertedPath = converted;
@@ -71,7 +70,7 @@ LDError LD_JDF::convertAllPDFs() {
         if (!separations.empty() || (!plainLayers.empty() && !m_XMLDieCuts.empty())) {
             const std::string input = vorlan::os::narrow(pdf->nativePath);
             std::vector<const char*> s = pointers(separations), l = pointers(plainLayers);
-            result = vorlan::pdf::convertPDF(zipFileSystem, input.c_str(), buffer, s.data(), l.data(),
+            result = vorlan::pdf::convertPDF(zipFileSystem, input.c_str(), buffer.c_str(), s.data(), l.data(),
                                              static_cast<int>(s.size()), static_cast<int>(l.size()));
         }
         if (result == 1) {

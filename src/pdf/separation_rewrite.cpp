@@ -417,6 +417,15 @@ int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* o
     return rewritten && saveDocument(*pdf, target) ? 0 : 1;
 }
 
+std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* input,
+                                           const std::vector<SeparationVariant>& variants) {
+    std::vector<int> results;
+    results.reserve(variants.size());
+    for (const SeparationVariant& variant : variants)
+        results.push_back(rewriteSeparations(fs, input, variant.output.c_str(), variant.separations, variant.keepListed));
+    return results;
+}
+
 int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output, const char* const* separations,
                        int count, bool keepListed) {
     std::vector<std::string> list;

@@ -33,4 +33,17 @@ int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* o
 int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output, const char* const* separations,
                        int count, bool keepListed);
 
+// One variant of a document: where it goes, which colorants are listed and how.
+struct SeparationVariant {
+    std::string output;
+    std::vector<std::string> separations;
+    bool keepListed = false;
+};
+
+// Writes every variant of `input`, each as rewriteSeparations would (0 written, 1 not), and
+// returns one result per variant in order. A variant that fails leaves nothing at its output
+// path (a file already there stays as it was).
+std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* input,
+                                           const std::vector<SeparationVariant>& variants);
+
 }  // namespace vorlan::pdf

@@ -1,0 +1,53 @@
+// The PDF-only ticket: no layout, one Media of the first page's size, and one run list holding
+// the selected pages once per group (content, die with content, die only), each part tagged with
+// what it shows.
+#include "jdf/ticket_writing.h"
+#include "jobpaths/pdf_only.h"
+#include "pdf/page_geometry.h"
+#include "platform/os/text.h"
+
+namespace {
+
+using namespace vorlan::jdf;
+
+void appendParts(LD_JDF& w, JDF::JDFRunList& runList, const LD_Run& run, const std::vector<int32_t>& pages) {
+    const JDF::WString url = pdfURL(w, run.pdf);
+    const bool die = run.contentType != CONTENT_CONTENT;
+    for (int32_t page : pages) {
+        JDF::JDFRunList part = need(runList.AddPDF(url, page, page));
+        setTicketAttribute(part, L"VersContentType", contentTypeText(run.contentType));
+        if (!die) {
+            if (run.VersionName) setVersionTags(part, run.VersionName, run.VersionIndex, run.VersionCopyCount);
+            continue;
+        }
+        if (run.NPage < 2) continue;  // a one-page die prints on one side
+        setTicketAttribute(part, L"is_duplex", L"1");
+        if (page == 0) setTicketAttribute(part, L"IsBackDie", L"false");
+        if (page == 1) setTicketAttribute(part, L"IsBackDie", L"true");
+    }
+}
+
+}  // namespace
+
+LDError PdfOnlyProcessingJdf::writeTicket() {
+    LD_JDF& w = *worker_;
+    return vorlan::jdf::writeTicket(w, outputPath_.c_str(), [&](JDF::JDFDoc& doc) {
+        JDF::JDFNode root = startCombinedNode(doc, L"Interpreting Rendering DigitalPrinting");
+        need(root.AppendMatchingResource(L"InterpretingParams", 1)).SetStatus(7);
+
+        // The first page's size as shown (width first); 0 0 when the page cannot be read.
+        double height = 0, width = 0;
+        const std::string input = vorlan::os::narrow(w.inputPDF->nativePath);
+        getFirstPageSize(w.zipFileSystem, input.c_str(), &height, &width);
+        JDF::JDFMedia media = need(JDF::JDFMedia(root.AppendMatchingResource(L"Media", 10)));
+        media.SetStatus(7);
+        media.SetDimension(JDF::JDFXYPair(width, height));
+
+        JDF::JDFRunList runList = need(JDF::JDFRunList(root.AppendMatchingResource(L"RunList", 10)));
+        runList.SetStatus(7);
+        appendParts(w, runList, *contentRun_, pages_);
+        if (w.dieEnabled && dieWithContentRun_) appendParts(w, runList, *dieWithContentRun_, pages_);
+        if (w.dieEnabled && dieOnlyRun_) appendParts(w, runList, *dieOnlyRun_, pages_);
+        return root.AppendMatchingResource(L"Component", 2).isNull() ? LD_FAILED : LD_OK;
+    });
+}
