@@ -10,11 +10,17 @@ namespace {
 
 using namespace vorlan::jdf;
 
-void appendParts(LD_JDF& w, JDF::JDFRunList& runList, const LD_Run& run, const std::vector<int32_t>& pages) {
+// Appends one Run partition per page, numbered on from `next`: the page of the run's file.
+void appendParts(LD_JDF& w, JDF::JDFRunList& runList, int32_t& next, const LD_Run& run,
+                 const std::vector<int32_t>& pages) {
     const JDF::WString url = pdfURL(w, run.pdf);
     const bool die = run.contentType != CONTENT_CONTENT;
     for (int32_t page : pages) {
-        JDF::JDFRunList part = need(runList.AddPDF(url, page, page));
+        JDF::JDFRunList part = runPartition(runList, next++);
+        setSinglePage(part, page);
+        JDF::JDFFileSpec file = need(need(part.GetCreateLayoutElement()).GetCreateFileSpec());
+        file.SetURL(url);
+        file.SetMimeType(L"application/pdf");
         setTicketAttribute(part, L"VersContentType", contentTypeText(run.contentType));
         if (!die) {
             if (run.VersionName) setVersionTags(part, run.VersionName, run.VersionIndex, run.VersionCopyCount);
@@ -45,9 +51,10 @@ LDError PdfOnlyProcessingJdf::writeTicket() {
 
         JDF::JDFRunList runList = need(JDF::JDFRunList(root.AppendMatchingResource(L"RunList", 10)));
         runList.SetStatus(7);
-        appendParts(w, runList, *contentRun_, pages_);
-        if (w.dieEnabled && dieWithContentRun_) appendParts(w, runList, *dieWithContentRun_, pages_);
-        if (w.dieEnabled && dieOnlyRun_) appendParts(w, runList, *dieOnlyRun_, pages_);
+        int32_t next = 0;
+        appendParts(w, runList, next, *contentRun_, pages_);
+        if (w.dieEnabled && dieWithContentRun_) appendParts(w, runList, next, *dieWithContentRun_, pages_);
+        if (w.dieEnabled && dieOnlyRun_) appendParts(w, runList, next, *dieOnlyRun_, pages_);
         return root.AppendMatchingResource(L"Component", 2).isNull() ? LD_FAILED : LD_OK;
     });
 }

@@ -1,6 +1,8 @@
 // Byte-slice editing of parsed content.
 #include "pdf/content_edit.h"
 
+#include "pdf/stream_compression.h"
+
 #include <qpdf/QPDFPageObjectHelper.hh>
 
 #include <algorithm>
@@ -232,9 +234,9 @@ void ContentEditor::apply(QPDF& pdf) {
     if (edits_.empty()) return;
     std::string bytes = result();
     if (content_.owner.isStream()) {
-        content_.owner.replaceStreamData(bytes, QPDFObjectHandle::newNull(), QPDFObjectHandle::newNull());
+        setCompressedStreamData(content_.owner, bytes);
     } else {
-        content_.owner.replaceKey("/Contents", QPDFObjectHandle::newStream(&pdf, bytes));
+        content_.owner.replaceKey("/Contents", newCompressedStream(pdf, bytes));
     }
     content_.bytes = std::move(bytes);
     edits_.clear();

@@ -1,6 +1,8 @@
 // Form variants: the first claims the original, the others get copies.
 #include "pdf/form_variants.h"
 
+#include "pdf/stream_compression.h"
+
 namespace vorlan::pdf {
 
 QPDFObjectHandle FormVariants::objectFor(QPDFObjectHandle form, const std::string& original, std::string bytes) {
@@ -16,7 +18,7 @@ QPDFObjectHandle FormVariants::objectFor(QPDFObjectHandle form, const std::strin
     auto copy = entry.copies.find(bytes);
     if (copy != entry.copies.end()) return copy->second;
     QPDFObjectHandle made = pdf_.makeIndirectObject(
-        QPDFObjectHandle::newStream(&pdf_, bytes));
+        newCompressedStream(pdf_, bytes));
     // The copy takes the form's dictionary (resources, matrix, box, group) but not its filters.
     QPDFObjectHandle dict = made.getDict();
     for (auto& [key, value] : form.getDict().ditems())
@@ -28,7 +30,7 @@ QPDFObjectHandle FormVariants::objectFor(QPDFObjectHandle form, const std::strin
 void FormVariants::finish() {
     for (auto& [objGen, entry] : entries_) {
         if (!entry.changed) continue;
-        entry.form.replaceStreamData(entry.claimed, QPDFObjectHandle::newNull(), QPDFObjectHandle::newNull());
+        setCompressedStreamData(entry.form, entry.claimed);
     }
     entries_.clear();
 }

@@ -1,7 +1,6 @@
 // Saving documents: name protection, atomic linearised save, output path preparation.
 #include "pdf/pdf_save.h"
 
-#include <qpdf/Pl_Flate.hh>
 #include <qpdf/QPDFWriter.hh>
 
 #include <cstdio>
@@ -109,16 +108,11 @@ bool saveDocument(QPDF& pdf, const std::filesystem::path& path) {
     temporary += ".vorlan-" + std::to_string(::getpid()) + ".tmp";
     try {
         protectNumberSignsInNames(pdf);
-        // Fast compression for the streams written anew: the files go to a print server, where
-        // a few percent of size matter less than the time of preparing every job.
-        Pl_Flate::setCompressionLevel(1);
         QPDFWriter writer(pdf, temporary.c_str());
         writer.setLinearization(true);
         writer.setDeterministicID(true);
         writer.write();
-        Pl_Flate::setCompressionLevel(-1);
     } catch (const std::exception&) {
-        Pl_Flate::setCompressionLevel(-1);
         std::error_code ec;
         fs::remove(temporary, ec);
         return false;
