@@ -50,6 +50,9 @@ public:
 
 protected:
     void handleStep(const Step& step) override {
+        if (states_ == StateLeaves::ColourOnly &&
+            (step.kind == StepKind::PathPart || step.kind == StepKind::PathPaint || step.kind == StepKind::TextShow))
+            return;
         switch (step.kind) {
             case StepKind::PathPart:
                 if (!inPath_) {
@@ -119,7 +122,7 @@ protected:
             }
             default:  // inline image parts before EI are part of the inline image
                 if (step.op == "BI" || step.op == "ID") return;
-                if (states_ == StateLeaves::None || (states_ == StateLeaves::Colour && !setsColour(step.op))) return;
+                if (states_ == StateLeaves::None || (states_ != StateLeaves::All && !setsColour(step.op))) return;
                 add(leaf(ElementKind::State, step));
                 return;
         }

@@ -77,7 +77,10 @@ struct Content {
 // Which operators that only change state become State leaves: all of them, only those that set
 // colours (cs CS sc scn SC SCN g G rg RG k K), or none. Leaving them out saves work for users
 // that edit only painting elements; the byte ranges of the other elements are the same.
-enum class StateLeaves { All, Colour, None };
+// ColourOnly keeps the colour operators and leaves out paths and text runs as well (they paint
+// with the colours those operators set): for users that edit only colours and what paints from
+// resources (images, inline images, shadings, forms).
+enum class StateLeaves { All, Colour, None, ColourOnly };
 
 // Parsed form contents shared between uses that inherit the same colour state (opt-in): a form
 // used many times is parsed once per distinct state. The cache keeps the states it was built

@@ -77,7 +77,7 @@ public:
         : pdf_(pdf), listed_(separations.begin(), separations.end()), keep_(keepListed), variants_(pdf) {}
 
     bool rewritePage(QPDFObjectHandle page) {
-        std::shared_ptr<Content> content = parsePageContent(page, &cache_, StateLeaves::Colour, &forms_);
+        std::shared_ptr<Content> content = parsePageContent(page, &cache_, StateLeaves::ColourOnly, &forms_);
         if (!content->complete && content->bytes.empty()) return false;  // unreadable: left alone
         ContentEditor editor(*content);
         if (keep_) editor.insertText(0, kKnockOutStart);
@@ -305,7 +305,7 @@ private:
     // Content that starts from its own state wherever it is used (coloured tiling patterns,
     // Type 3 glyphs): edited in place.
     void rewriteStreamInPlace(QPDFObjectHandle stream, QPDFObjectHandle parentResources, bool knockOutStart) {
-        std::shared_ptr<Content> content = parseFormContent(stream, parentResources, GraphicsState::initial(), &cache_, StateLeaves::Colour);
+        std::shared_ptr<Content> content = parseFormContent(stream, parentResources, GraphicsState::initial(), &cache_, StateLeaves::ColourOnly);
         if (!content->complete && content->bytes.empty()) return;
         ContentEditor editor(*content);
         if (knockOutStart) editor.insertText(0, kKnockOutStart);
@@ -315,8 +315,11 @@ private:
 
     // Type 3 glyphs may set their own colours (d0): their procedures are rewritten once per font.
     void rewriteFonts(QPDFObjectHandle resources) {
+        // Resources and font dictionaries shared by many pages are looked through once.
+        if (resources.isIndirect() && !done_.insert(resources.getObjGen()).second) return;
         QPDFObjectHandle fonts = resources.isDictionary() ? resources.getKey("/Font") : resources;
         if (!fonts.isDictionary()) return;
+        if (fonts.isIndirect() && !done_.insert(fonts.getObjGen()).second) return;
         for (auto& [name, font] : fonts.ditems()) {
             if (!font.isDictionary() || !font.getKey("/Subtype").isNameAndEquals("/Type3")) continue;
             QPDFObjectHandle procs = font.getKey("/CharProcs");
@@ -361,7 +364,7 @@ private:
     }
 
     QPDFObjectHandle rewriteAppearance(QPDFObjectHandle stream, QPDFObjectHandle pageResources) {
-        std::shared_ptr<Content> content = parseFormContent(stream, pageResources, GraphicsState::initial(), &cache_, StateLeaves::Colour);
+        std::shared_ptr<Content> content = parseFormContent(stream, pageResources, GraphicsState::initial(), &cache_, StateLeaves::ColourOnly);
         if (!content->complete && content->bytes.empty()) return stream;
         ContentEditor editor(*content);
         if (keep_) editor.insertText(0, kKnockOutStart);
