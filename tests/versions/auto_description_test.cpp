@@ -235,3 +235,20 @@ TEST(AutoDescriptionPlates, FirstVariantLeavesTheDiePlateBlank) {
         EXPECT_EQ(plates.count("Die") ? plates["Die"] : 0, 0) << "the die plate of the first variant is inked";
     }
 }
+
+TEST(AutoDescription, ReadsTheGeneratedFileBack) {
+    vorlan::test::TempDir dir;
+    vorlan::test::writeFile(dir / "d.impinfo", "<OptionalContentGroupData/>");
+    LD_JDF worker;
+    char* buffer = nullptr;
+    long length = -1;
+    ASSERT_TRUE(worker.parseImpInfoFile((dir / "d.impinfo").c_str(), &buffer, &length));
+    std::unique_ptr<char, decltype(&std::free)> owned(buffer, &std::free);
+    EXPECT_EQ(length, 27);
+    EXPECT_EQ(std::string(buffer, 27 + 16), std::string("<OptionalContentGroupData/>") + std::string(16, '\0'));
+
+    testing::internal::CaptureStderr();
+    EXPECT_FALSE(worker.parseImpInfoFile((dir / "missing.impinfo").c_str(), &buffer, &length));
+    EXPECT_EQ(testing::internal::GetCapturedStderr(),
+              "Invalid or absent xml buffer file, continuing as unversioned job... \n");
+}
