@@ -13,7 +13,7 @@ struct InkDescription {
     };
     struct ContentObject {
         int index = 0;
-        const std::vector<std::string>* sepNameOff = nullptr;  // inks switched off; null: none
+        const std::vector<std::string>* sepNameOff = nullptr;  // inks switched off (not owned); null: none
     };
 
     std::vector<Layer> layers;           // one OptionalLayer (isSep) each, in order
