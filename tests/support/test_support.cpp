@@ -41,6 +41,13 @@ TempDir::~TempDir() {
     fs::remove_all(path_, ec);
 }
 
+DieLibraryHome::DieLibraryHome(const std::string& library) {
+    writeFile(home_ / "DieLib" / "AutoDieLib.xml", library);
+    setenv("VORLAN_HOME", home_.path().c_str(), 1);
+}
+
+DieLibraryHome::~DieLibraryHome() { unsetenv("VORLAN_HOME"); }
+
 void writeFile(const fs::path& file, const std::string& bytes) {
     if (file.has_parent_path()) fs::create_directories(file.parent_path());
     std::ofstream out(file, std::ios::binary | std::ios::trunc);

@@ -26,6 +26,17 @@ private:
     std::filesystem::path path_;
 };
 
+// Points VORLAN_HOME at a fresh folder holding `library` as the die library
+// (DieLib/AutoDieLib.xml), for the object's lifetime.
+class DieLibraryHome {
+public:
+    explicit DieLibraryHome(const std::string& library);
+    ~DieLibraryHome();
+
+private:
+    TempDir home_;
+};
+
 // Writes bytes to a file, creating parent folders.
 void writeFile(const std::filesystem::path& file, const std::string& bytes);
 // Reads a whole file; empty when it cannot be read.
