@@ -13,6 +13,8 @@ inline const wchar_t* const kMakerTicketNs = L"http://www.vorlan.org/JDF/1.0";
 inline const wchar_t* const kDeliveryOptionsNs = L"http://www.vorlan.org/JDF/delivery/1.0";
 
 struct TicketRewrite {
+    TicketRewrite(AutoImpositionSettings& s, ImpositionChanges& c) : settings(s), changes(c) {}
+
     AutoImpositionSettings& settings;
     ImpositionChanges& changes;
     JDF::JDFNode rootNode;

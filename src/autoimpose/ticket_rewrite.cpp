@@ -51,7 +51,7 @@ bool rewriteTicket(AutoImpositionSettings& settings, ImpositionChanges& changes)
     try {
         JDF::JDFParser parser;
         if (settings.jdfPath.empty() || !parser.Parse(JDF::WString(settings.jdfPath))) return false;
-        TicketRewrite t{settings, changes};
+        TicketRewrite t(settings, changes);
         t.rootNode = JDF::JDFDoc(parser.GetDocument()).GetJDFRoot();
         return rewrite(t, parser.GetDocument());
     } catch (const std::exception&) {
