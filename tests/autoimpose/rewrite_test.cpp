@@ -22,15 +22,34 @@ std::vector<WString> attributeOf(const vElement& elements, const wchar_t* name) 
 
 vElement children(const KElement& parent, const wchar_t* name) { return parent.GetChildrenByTagName(name); }
 
-void expectSchemaValid(const Imposed& imposed) {
-    if (vorlan::test::corpusDir().empty()) return;  // the schema lives in the corpus
-    std::string report;
-    EXPECT_TRUE(vorlan::test::filesFailingJdfSchema({imposed.ticket}, &report).empty()) << report;
-}
+// Tickets to validate against the JDF 1.8 schema in one xmllint run, at the end of the test.
+class SchemaCheck {
+public:
+    // A copy of the ticket, taken now.
+    void add(const std::filesystem::path& ticket) {
+        files_.push_back(dir_ / (std::to_string(files_.size()) + ".jdf"));
+        std::filesystem::copy_file(ticket, files_.back());
+    }
+    void add(const JDFDoc& doc) {
+        files_.push_back(dir_ / (std::to_string(files_.size()) + ".jdf"));
+        EXPECT_TRUE(doc.Write2File(WString(files_.back().string())));
+    }
+    ~SchemaCheck() {
+        if (vorlan::test::corpusDir().empty()) return;  // the schema lives in the corpus
+        std::string report;
+        EXPECT_TRUE(vorlan::test::filesFailingJdfSchema(files_, &report).empty()) << report;
+    }
+
+private:
+    vorlan::test::TempDir dir_;
+    std::vector<std::filesystem::path> files_;
+};
 
 }  // namespace
 
 TEST(AutoImposeRewrite, TemplatePagesBecomeMarksAndLabelsAndJobPagesAreRenumbered) {
+    SchemaCheck schema;
+    schema.add(buildTemplateTicket());
     Imposed t(buildTemplateTicket(),
               "<Layout><SheetLabels JobNamePrint='1' SurfaceNumberPrint='1' JobNameString='J'/></Layout>");
     ASSERT_EQ(t.result, LD_OK);
@@ -84,7 +103,7 @@ TEST(AutoImposeRewrite, TemplatePagesBecomeMarksAndLabelsAndJobPagesAreRenumbere
         EXPECT_EQ(device.GetAttribute(L"FontSize"), L"9");
         EXPECT_TRUE(markObjects[0].GetElement(L"JobField").isNull());
     }
-    expectSchemaValid(t);
+    schema.add(t.ticket);
 }
 
 TEST(AutoImposeRewrite, LabelsWithoutATemplateGetAnEmptyJobField) {
@@ -148,6 +167,7 @@ TEST(AutoImposeRewrite, StackingByBinding) {
          {L"0", L"1"}},
         {"<Layout><Binding Type='17' row='2'/></Layout>", false, L"", {L"", L""}},
     };
+    SchemaCheck schema;
     for (const Case& c : cases) {
         SCOPED_TRACE(c.settings);
         Imposed t(buildTemplateTicket({0, 0, 3, 2, true}), c.settings);
@@ -167,7 +187,7 @@ TEST(AutoImposeRewrite, StackingByBinding) {
         EXPECT_EQ(attributeOf(back, L"LogicalStackOrd"), (std::vector<WString>{c.backStacks[0], c.backStacks[1], L""}));
         // A variable-data job's run lists carry metadata maps, which the JDF 1.8 schema does not know.
         if (!t.root.GetMatchingResource(L"RunList", 10).GetElement(L"RunList").HasChildElement(L"MetadataMap", L""))
-            expectSchemaValid(t);
+            schema.add(t.ticket);
     }
 }
 
@@ -223,6 +243,7 @@ TEST(AutoImposeRewrite, SheetRangesByRangeType) {
         {"<RangeInfo Type='5' ", L"SetIndex", {L"0 ~ 1", L"4"}, L"0 ~ -1"},
         {"<RangeInfo Type='9' TotalCount='4'/>", L"SheetIndex", {}, L"0 ~ -1"},
     };
+    SchemaCheck schema;
     for (const Case& c : cases) {
         std::string settings = c.settings;
         if (settings.back() == ' ') settings += ranges + "</RangeInfo>";
@@ -242,7 +263,7 @@ TEST(AutoImposeRewrite, SheetRangesByRangeType) {
         if (c.partKey) {
             EXPECT_EQ(attributeOf(children(link, L"Part"), c.partKey), c.parts);
         }
-        expectSchemaValid(t);
+        schema.add(t.ticket);
     }
 }
 
