@@ -1,300 +1,189 @@
-// The ticket rewrite on template tickets built through the JDF layer.
+// The ticket rewrite on template tickets, checked with XPath queries on the rewritten ticket and
+// with the JDF 1.8 schema.
 #include <cstdlib>
 
 #include <gtest/gtest.h>
 
 #include "platform/jobstore/job_store.h"
 #include "template_ticket.h"
-#include "test_support.h"
+#include "vorlan/LD_JDF.h"
 
-using namespace JDF;
-using autoimpose_test::buildTemplateTicket;
-using autoimpose_test::Imposed;
 using autoimpose_test::TemplateShape;
+namespace fs = std::filesystem;
 
 namespace {
 
-std::vector<WString> attributeOf(const vElement& elements, const wchar_t* name) {
-    std::vector<WString> values;
-    for (const KElement& e : elements) values.push_back(e.GetAttribute(name));
-    return values;
-}
+// Run lists by link, side partitions by position, and the first side's objects.
+const std::string kDocument = "/JDF/ResourcePool/RunList[@ID=//RunListLink[@ProcessUsage='Document']/@rRef]";
+const std::string kMarks = "/JDF/ResourcePool/RunList[@ID=//RunListLink[@ProcessUsage='Marks']/@rRef]";
+const std::string kOutputLink = "//RunListLink[@Usage='Output']";
+const std::string kSides = "/JDF/ResourcePool/Layout/Layout/Layout/Layout";
+const std::string kFront = kSides + "[1]/ContentObject";
+const std::string kBack = kSides + "[2]/ContentObject";
 
-vElement children(const KElement& parent, const wchar_t* name) { return parent.GetChildrenByTagName(name); }
+// A template written to a folder and imposed there through the worker.
+struct Imposed {
+    vorlan::test::TempDir dir;
+    fs::path ticket = dir / "ticket.jdf";
+    LDError result;
 
-// Tickets to validate against the JDF 1.8 schema in one xmllint run, at the end of the test.
-class SchemaCheck {
-public:
-    // A copy of the ticket, taken now.
-    void add(const std::filesystem::path& ticket) {
-        files_.push_back(dir_ / (std::to_string(files_.size()) + ".jdf"));
-        std::filesystem::copy_file(ticket, files_.back());
+    Imposed(const TemplateShape& shape, const std::string& settings) {
+        EXPECT_TRUE(autoimpose_test::buildTemplateTicket(shape).Write2File(JDF::WString(ticket.string())));
+        autoimpose_test::writeSettings(dir / "s.xml", settings);
+        result = LD_JDF().JDF_AutoImposition((dir / "s.xml").c_str(), ticket.c_str());
     }
-    void add(const JDFDoc& doc) {
-        files_.push_back(dir_ / (std::to_string(files_.size()) + ".jdf"));
-        EXPECT_TRUE(doc.Write2File(WString(files_.back().string())));
+    // The values the query selects in the rewritten ticket, joined by '|': attribute values,
+    // element names; or the value of a query that selects no nodes (namespace-uri(…)).
+    std::string select(const std::string& query) const {
+        pugi::xml_document doc;
+        doc.load_file(ticket.c_str());
+        pugi::xpath_query compiled(query.c_str());
+        if (compiled.return_type() != pugi::xpath_type_node_set) return compiled.evaluate_string(doc);
+        std::string out;
+        for (const pugi::xpath_node& n : compiled.evaluate_node_set(doc))
+            out += (out.empty() ? "" : "|") + std::string(n.attribute() ? n.attribute().value() : n.node().name());
+        return out;
     }
-    ~SchemaCheck() {
-        if (vorlan::test::corpusDir().empty()) return;  // the schema lives in the corpus
-        std::string report;
-        EXPECT_TRUE(vorlan::test::filesFailingJdfSchema(files_, &report).empty()) << report;
-    }
+};
 
-private:
-    vorlan::test::TempDir dir_;
-    std::vector<std::filesystem::path> files_;
+struct Case {
+    TemplateShape shape;
+    std::string settings;
+    std::vector<std::pair<std::string, std::string>> expect;  // query → values
+};
+
+const std::string kRanges = " Count='2'><Range StartIndex='1' EndIndex='2'/><Range StartIndex='5' EndIndex='5'/>";
+
+const Case kCases[] = {
+    // Two mark pages and one label page: Ord 0 and 1 become marks, 2 a label, 3 and 4 become 0 and 1.
+    {{}, "<Layout><SheetLabels JobNamePrint='1' SurfaceNumberPrint='1' JobNameString='J'/></Layout>",
+     {{"//RenderingParams/@Interleaved", "true"}, {"//RenderingParams/@Status", "Available"},
+      {kDocument + "/RunList/LayoutElement/FileSpec/@URL", "file:///tmp/template/job.pdf"},
+      {kDocument + "/RunList/@Pages", "0 ~ -1"}, {kDocument + "/RunList/@RunTag", "PDF_Job"},
+      {kMarks + "/@RunTag", "PDF_Job"}, {kMarks + "/@Status", "Available"}, {kMarks + "/RunList/@Pages", "0 ~ -1"},
+      {kMarks + "/RunList/LayoutElement/FileSpec/@URL", "file:///tmp/template/Mark.tmp"},
+      {"/JDF/ResourcePool/Layout/@Automated", "true"}, {"//@BaseOrdReset", ""},
+      {"/JDF/ResourcePool/Layout/@PartIDKeys", "RunTags SheetName Side"},
+      {"/JDF/ResourcePool/Layout/Layout/@RunTags", "PDF_Job"}, {"//@SignatureName", ""},
+      {kSides + "/@Side", "Front|Back"}, {kFront + "/@Ord", "0|1"}, {kBack + "/@CTM", "1 0 0 1 30 1|1 0 0 1 40 1"},
+      {kSides + "[2]/MarkObject/@Ord", "0|1"},
+      {kSides + "[2]/MarkObject/@CTM", "1 0 0 1 0 1|1 0 0 1 10 1|1 0 0 1 20 1"},
+      {kSides + "[1]/MarkObject[3]/@ClipBox", "0 0 102 50"},
+      {"//MarkObject/JobField/@JobFormat", "J Sheet %d/%s|J Sheet %d/%s"},
+      {"//MarkObject/JobField/@JobTemplate", "SheetCount, Side|SheetCount, Side"},
+      {"//MarkObject/DeviceMark/@Font", "Times-Roman|Times-Roman"}, {"//MarkObject/DeviceMark/@FontSize", "9|9"},
+      {"//@TrimSize|//FitPolicy|//LogicalStackParams|//MetadataMap|//KAV:OrvelDeliveryOptions", ""}}},
+    // Labels only, the job name only: no label run list, a bare job field; rendering params added.
+    {{0, 1, 1, 1, false}, "<Layout><SheetLabels JobNamePrint='1' JobNameString='J'/></Layout>",
+     {{kMarks, ""}, {"//MarkObject/JobField", "JobField"}, {"//MarkObject/JobField/@*", ""},
+      {"//ContentObject/@Ord", "0"}, {"//RenderingParams/@Interleaved", "true"}}},
+    // Reverse delivery of a variable-data job: delivery options, sides turned, PDFVT_Job tags.
+    {{}, "<Layout isDuplex='2'/><JobTypePDL pdl='4'/><PageDeliveryInfo PageDelivery='ReverseOrderFaceUp'/>",
+     {{kDocument + "/KAV:OrvelDeliveryOptions/@*", "reverse|true"},
+      {"namespace-uri(//KAV:OrvelDeliveryOptions)", "http://www.vorlan.org/JDF/delivery/1.0"},
+      {kSides + "/@Side", "Back|Front"}, {"//Layout/@BaseOrdReset", "PagePoolList"},
+      {"//Layout/Layout/@RunTags", "PDFVT_Job"}, {kMarks + "/@RunTag", "PDFVT_Job"},
+      {kDocument + "/RunList/@RunTag", "PDFVT_Job"},
+      {kDocument + "/RunList/MetadataMap/@*", "PartIDKeys|RunTags|%s|doctype|Document"},
+      {kDocument + "/RunList/MetadataMap/Expr/@*", "doctype|PDFVT_Job"}}},
+    {{}, "<Layout isDuplex='1'/><PageDeliveryInfo PageDelivery='ReverseOrderFaceUp'/>",
+     {{"//KAV:OrvelDeliveryOptions/@TwoSided", "false"}, {"//MetadataMap", ""}}},
+    {{}, "<Layout isDuplex='-1'/><PageDeliveryInfo PageDelivery='ReverseOrderFaceUp'/>",
+     {{"//KAV:OrvelDeliveryOptions/@TwoSided", "true"}}},
+    // Stacking: binding 10 mirrors the back; 12 does not; 17 only for variable data, depth 1.
+    {{0, 0, 3}, "<Layout><Binding Type='10' row='2' MaxStackDepth='-3'/></Layout>",
+     {{"//LogicalStackParams/@Restrictions", "None"}, {"//LogicalStackParams/@MaxStackDepth", "3"},
+      {"//Stack/@LogicalStackOrd", "0|1"}, {"//Stack/@LogicalStackSequence", "SheetIndex|SheetIndex"},
+      {kFront + "/@Ord", "0|0|2"}, {kFront + "/@LogicalStackOrd", "0|1"},
+      {kBack + "/@Ord", "1|1|2"}, {kBack + "/@LogicalStackOrd", "1|0"}}},
+    {{0, 0, 3}, "<Layout><Binding Type='12' col='2'/></Layout>",
+     {{"//LogicalStackParams/@MaxStackDepth", ""}, {kBack + "/@LogicalStackOrd", "0|1"}}},
+    {{0, 0, 3}, "<Layout><Binding Type='17' row='2' MaxStackDepth='-5'/></Layout><JobTypePDL pdl='4'/>",
+     {{"//LogicalStackParams/@MaxStackDepth", "1"}, {kBack + "/@Ord", "1|1|2"}}},
+    {{0, 0, 3}, "<Layout><Binding Type='17' row='2'/></Layout>", {{"//LogicalStackParams", ""}}},
+    // Trim sizes and fit policies.
+    {{1, 0, 2}, "<Layout SizePolicy='7'><BleedSize x='5' y='6.5'/><FinishSize ord='0' x='1' y='2'/></Layout>",
+     {{kFront + "/@TrimSize", "5 6.5|5 6.5"}, {kBack + "/FitPolicy/@SizePolicy", "FitToPage|FitToPage"},
+      {kBack + "/FitPolicy/@RotatePolicy", "NoRotate|NoRotate"}}},
+    {{1, 0, 2}, "<Layout SizePolicy='6' RotationPolicy='2'><FinishSize ord='0' x='210' y='297'/></Layout>",
+     {{kFront + "/@TrimSize", "210 297|210 297"}, {kFront + "/FitPolicy/@SizePolicy", "ClipToMaxPage|ClipToMaxPage"},
+      {kFront + "/FitPolicy/@RotatePolicy", "RotateCounterClockwise|RotateCounterClockwise"}}},
+    {{1, 0, 1}, "<Layout RotationPolicy='1'><FinishSize ord='1' x='210' y='297'/></Layout>",
+     {{kBack + "/@TrimSize", "0 0"}, {kBack + "/FitPolicy/@*", "RotateClockwise"}}},
+    {{1, 0, 1}, "<Layout SizePolicy='5' ImpositionMode='1'/>", {{kBack + "/@TrimSize", "0 0"}, {"//FitPolicy", ""}}},
+    {{1, 0, 1}, "<Layout SizePolicy='2'/>", {{"//@TrimSize", ""}}},
+    // Sheet ranges by RangeType.
+    {{}, "<RangeInfo Type='1' TotalCount='6'/>",
+     {{kOutputLink + "/Part/@SheetIndex", "1|3|5"},
+      {"/JDF/ResourcePool/RunList[@ID=" + kOutputLink + "/@rRef]/@PartIDKeys", "SheetIndex"}}},
+    {{}, "<RangeInfo Type='2' TotalCount='5'/>", {{kOutputLink + "/Part/@SheetIndex", "0|2|4"}}},
+    {{}, "<RangeInfo Type='3'" + kRanges + "</RangeInfo>",
+     {{kDocument + "/RunList/@Pages", "0 ~ 1 4"}, {kOutputLink, ""}}},
+    {{}, "<RangeInfo Type='4'" + kRanges + "</RangeInfo>", {{kOutputLink + "/Part/@SheetIndex", "0 ~ 1|4"}}},
+    {{}, "<RangeInfo Type='5'" + kRanges + "</RangeInfo>",
+     {{"//RunListLink[@ProcessUsage='Document']/Part/@SetIndex", "0 ~ 1|4"}, {kOutputLink, ""}}},
+    {{}, "<RangeInfo Type='9' TotalCount='4'/>", {{kOutputLink, "RunListLink"}, {kOutputLink + "/Part", ""}}},
 };
 
 }  // namespace
 
-TEST(AutoImposeRewrite, TemplatePagesBecomeMarksAndLabelsAndJobPagesAreRenumbered) {
-    SchemaCheck schema;
-    schema.add(buildTemplateTicket());
-    Imposed t(buildTemplateTicket(),
-              "<Layout><SheetLabels JobNamePrint='1' SurfaceNumberPrint='1' JobNameString='J'/></Layout>");
-    ASSERT_EQ(t.result, LD_OK);
-    JDFRenderingParams rendering = t.root.GetMatchingResource(L"RenderingParams", 3);
-    EXPECT_TRUE(rendering.GetInterleaved());
-    EXPECT_EQ(rendering.GetAttribute(L"Status"), L"Available");
-
-    // The template's runs leave the document run list; the marks get a run list of their own.
-    JDFRunList document = t.root.GetMatchingResource(L"RunList", 10);
-    vElement runs = children(document, L"RunList");
-    ASSERT_EQ(runs.size(), 1u);
-    EXPECT_EQ(JDFRunList(runs[0]).GetFileURL(), L"file:///tmp/template/job.pdf");
-    EXPECT_EQ(runs[0].GetAttribute(L"Pages"), L"0 ~ -1");
-    EXPECT_EQ(runs[0].GetAttribute(L"RunTag"), L"PDF_Job");
-    EXPECT_FALSE(runs[0].HasChildElement(L"MetadataMap", L""));
-    EXPECT_FALSE(document.HasChildElement(L"KAV:OrvelDeliveryOptions", L""));
-    JDFRunList marks = t.root.GetMatchingResource(L"RunList", 9);
-    ASSERT_FALSE(marks.isNull());
-    EXPECT_EQ(marks.GetAttribute(L"RunTag"), L"PDF_Job");
-    EXPECT_EQ(marks.GetAttribute(L"Status"), L"Available");
-    JDFRunList markRun = marks.GetElement(L"RunList");
-    EXPECT_EQ(markRun.GetFileURL(), L"file:///tmp/template/Mark.tmp");
-    EXPECT_EQ(markRun.GetAttribute(L"Pages"), L"0 ~ -1");
-
-    JDFLayout layout = t.layout();
-    EXPECT_TRUE(layout.GetAutomated());
-    EXPECT_FALSE(layout.HasAttribute(L"BaseOrdReset", L"", false));
-    EXPECT_EQ(layout.GetAttribute(L"PartIDKeys"), L"RunTags SheetName Side");
-    KElement signature = layout.GetElement(L"Layout");
-    EXPECT_EQ(signature.GetAttribute(L"RunTags"), L"PDF_Job");
-    EXPECT_FALSE(signature.HasAttribute(L"SignatureName"));
-    EXPECT_TRUE(layout.GetLogicalStackParams().isNull());
-
-    for (int s = 0; s < 2; ++s) {
-        JDFLayout side = t.side(s);
-        EXPECT_EQ(side.GetAttribute(L"Side"), s ? L"Back" : L"Front");  // forward delivery keeps the sides
-        vElement objects = children(side, L"ContentObject");
-        EXPECT_EQ(attributeOf(objects, L"Ord"), (std::vector<WString>{L"0", L"1"}));
-        EXPECT_EQ(JDFContentObject(objects[0]).GetCTM(), JDFMatrix(1, 0, 0, 1, 30, s));
-        EXPECT_FALSE(objects[0].HasAttribute(L"TrimSize") || objects[0].HasChildElement(L"FitPolicy", L""));
-        vElement markObjects = children(side, L"MarkObject");
-        ASSERT_EQ(markObjects.size(), 3u);
-        EXPECT_EQ(attributeOf(markObjects, L"Ord"), (std::vector<WString>{L"0", L"1", L""}));
-        EXPECT_EQ(JDFMarkObject(markObjects[1]).GetCTM(), JDFMatrix(1, 0, 0, 1, 10, s));
-        EXPECT_EQ(JDFMarkObject(markObjects[2]).GetClipBox(), JDFRectangle(0, 0, 102, 50));
-        KElement field = markObjects[2].GetElement(L"JobField");
-        EXPECT_EQ(field.GetAttribute(L"JobFormat"), L"J Sheet %d/%s");
-        EXPECT_EQ(field.GetAttribute(L"JobTemplate"), L"SheetCount, Side");
-        KElement device = markObjects[2].GetElement(L"DeviceMark");
-        EXPECT_EQ(device.GetAttribute(L"Font"), L"Times-Roman");
-        EXPECT_EQ(device.GetAttribute(L"FontSize"), L"9");
-        EXPECT_TRUE(markObjects[0].GetElement(L"JobField").isNull());
+TEST(AutoImposeRewrite, TemplatesBecomeTicketsThatStayValid) {
+    vorlan::test::TempDir dir;
+    std::vector<fs::path> valid;
+    ASSERT_TRUE(autoimpose_test::buildTemplateTicket().Write2File(JDF::WString((dir / "template.jdf").string())));
+    valid.push_back(dir / "template.jdf");
+    for (const Case& c : kCases) {
+        SCOPED_TRACE(c.settings);
+        Imposed t(c.shape, c.settings);
+        ASSERT_EQ(t.result, LD_OK);
+        for (const auto& [query, values] : c.expect) EXPECT_EQ(t.select(query), values) << query;
+        // JDF 1.8 knows no FitPolicy in a content object and no MetadataMap in a run list.
+        if (!t.select("//FitPolicy|//MetadataMap").empty()) continue;
+        valid.push_back(dir / (std::to_string(valid.size()) + ".jdf"));
+        fs::copy_file(t.ticket, valid.back());
     }
-    schema.add(t.ticket);
+    if (vorlan::test::corpusDir().empty()) GTEST_SKIP() << "corpus with the JDF schema not found";
+    std::string report;
+    EXPECT_TRUE(vorlan::test::filesFailingJdfSchema(valid, &report).empty()) << report;
 }
 
-TEST(AutoImposeRewrite, LabelsWithoutATemplateGetAnEmptyJobField) {
-    // Only the job name: no template text, so the job field stays bare.
-    Imposed t(buildTemplateTicket({0, 1, 1, 1, false}), "<Layout><SheetLabels JobNamePrint='1' JobNameString='J'/></Layout>");
-    ASSERT_EQ(t.result, LD_OK);
-    EXPECT_TRUE(t.root.GetMatchingResource(L"RunList", 9).isNull());  // labels get no run list
-    EXPECT_FALSE(t.root.GetMatchingResource(L"RenderingParams", 3).isNull());  // added
-    KElement field = t.side(0).GetMarkObject(0).GetElement(L"JobField");
-    ASSERT_FALSE(field.isNull());
-    EXPECT_EQ(field.NumAttributes(), 0);
-    EXPECT_EQ(t.side(0).GetContentObject(0).GetOrd(), 0);
-}
-
-TEST(AutoImposeRewrite, ReverseDeliveryOfAVariableDataJob) {
+TEST(AutoImposeRewrite, VariableDataJobsAreNotRecordedByTheServer) {
     vorlan::test::TempDir store;
     ::setenv("VORLAN_JOB_STORE", store.path().c_str(), 1);
-    for (const auto& [duplex, twoSided] : {std::pair{"1", L"false"}, {"2", L"true"}, {"-1", L"true"}}) {
-        Imposed t(buildTemplateTicket(), std::string("<Layout isDuplex='") + duplex +
-                                             "'/><JobTypePDL pdl='4' jobnum='31'/>"
-                                             "<PageDeliveryInfo PageDelivery='ReverseOrderFaceUp'/>");
-        ASSERT_EQ(t.result, LD_OK);
-        EXPECT_EQ(t.root.GetAttribute(L"xmlns:KAV"), L"http://www.vorlan.org/JDF/1.0");
-        KElement delivery = t.root.GetMatchingResource(L"RunList", 10).GetElement(L"KAV:OrvelDeliveryOptions");
-        EXPECT_EQ(delivery.GetNamespaceURI(), L"http://www.vorlan.org/JDF/delivery/1.0");
-        EXPECT_EQ(delivery.GetAttribute(L"OutputDelivery"), L"reverse");
-        EXPECT_EQ(delivery.GetAttribute(L"TwoSided"), twoSided) << duplex;
-    }
-    vorlan::jobstore::JobAttributeStore jobs(store.path());
-    EXPECT_EQ(jobs.get(31, "ignore_record_ progress"), "1");
-
-    Imposed t(buildTemplateTicket(), "<JobTypePDL pdl='4'/><PageDeliveryInfo PageDelivery='ReverseOrderFaceUp'/>");
+    Imposed t({}, "<JobTypePDL pdl='4' jobnum='31'/><PageDeliveryInfo PageDelivery='ReverseOrderFaceUp'/>");
     ::unsetenv("VORLAN_JOB_STORE");
-    EXPECT_EQ(t.side(0).GetAttribute(L"Side"), L"Back");
-    EXPECT_EQ(t.side(1).GetAttribute(L"Side"), L"Front");
-    EXPECT_EQ(t.layout().GetAttribute(L"BaseOrdReset"), L"PagePoolList");
-    EXPECT_EQ(t.layout().GetElement(L"Layout").GetAttribute(L"RunTags"), L"PDFVT_Job");
-    EXPECT_EQ(t.root.GetMatchingResource(L"RunList", 9).GetAttribute(L"RunTag"), L"PDFVT_Job");
-    KElement run = t.root.GetMatchingResource(L"RunList", 10).GetElement(L"RunList");
-    EXPECT_EQ(run.GetAttribute(L"RunTag"), L"PDFVT_Job");
-    KElement map = run.GetElement(L"MetadataMap");
-    using Attributes = std::map<WString, WString>;
-    EXPECT_EQ(Attributes(map.GetAttributeMap()), (Attributes{{L"DataType", L"PartIDKeys"}, {L"Name", L"RunTags"},
-                                                             {L"ValueFormat", L"%s"}, {L"ValueTemplate", L"doctype"},
-                                                             {L"Context", L"Document"}}));
-    EXPECT_EQ(Attributes(map.GetElement(L"Expr").GetAttributeMap()),
-              (Attributes{{L"Name", L"doctype"}, {L"Value", L"PDFVT_Job"}}));
-}
-
-TEST(AutoImposeRewrite, StackingByBinding) {
-    struct Case {
-        const char* settings;
-        bool stacked;
-        const wchar_t* depth;
-        std::vector<WString> backStacks;
-    };
-    const Case cases[] = {
-        {"<Layout><Binding Type='10' row='2' col='1' MaxStackDepth='-3'/></Layout>", true, L"3", {L"1", L"0"}},
-        {"<Layout><Binding Type='12' row='1' col='2'/></Layout>", true, L"", {L"0", L"1"}},
-        {"<Layout><Binding Type='17' row='2' MaxStackDepth='-5'/></Layout><JobTypePDL pdl='4'/>", true, L"1",
-         {L"0", L"1"}},
-        {"<Layout><Binding Type='17' row='2'/></Layout>", false, L"", {L"", L""}},
-    };
-    SchemaCheck schema;
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.settings);
-        Imposed t(buildTemplateTicket({0, 0, 3, 2, true}), c.settings);
-        ASSERT_EQ(t.result, LD_OK);
-        JDFLogicalStackParams params = t.layout().GetLogicalStackParams();
-        ASSERT_EQ(params.isNull(), !c.stacked);
-        if (!c.stacked) continue;
-        EXPECT_EQ(params.GetAttribute(L"Restrictions"), L"None");
-        EXPECT_EQ(params.GetAttribute(L"MaxStackDepth"), c.depth);
-        vElement stacks = children(params, L"Stack");
-        EXPECT_EQ(attributeOf(stacks, L"LogicalStackOrd"), (std::vector<WString>{L"0", L"1"}));
-        EXPECT_EQ(attributeOf(stacks, L"LogicalStackSequence"), (std::vector<WString>{L"SheetIndex", L"SheetIndex"}));
-        vElement front = children(t.side(0), L"ContentObject"), back = children(t.side(1), L"ContentObject");
-        EXPECT_EQ(attributeOf(front, L"Ord"), (std::vector<WString>{L"0", L"0", L"2"}));
-        EXPECT_EQ(attributeOf(front, L"LogicalStackOrd"), (std::vector<WString>{L"0", L"1", L""}));
-        EXPECT_EQ(attributeOf(back, L"Ord"), (std::vector<WString>{L"1", L"1", L"2"}));
-        EXPECT_EQ(attributeOf(back, L"LogicalStackOrd"), (std::vector<WString>{c.backStacks[0], c.backStacks[1], L""}));
-        // A variable-data job's run lists carry metadata maps, which the JDF 1.8 schema does not know.
-        if (!t.root.GetMatchingResource(L"RunList", 10).GetElement(L"RunList").HasChildElement(L"MetadataMap", L""))
-            schema.add(t.ticket);
-    }
-}
-
-TEST(AutoImposeRewrite, TrimSizesAndFitPolicies) {
-    struct Case {
-        const char* settings;
-        const wchar_t* trim;
-        const wchar_t* size;    // FitPolicy SizePolicy; null: no FitPolicy
-        const wchar_t* rotate;
-    };
-    const Case cases[] = {
-        {"<Layout SizePolicy='7'><BleedSize x='5' y='6.5'/><FinishSize ord='0' x='1' y='2'/></Layout>", L"5 6.5",
-         L"FitToPage", L"NoRotate"},
-        {"<Layout SizePolicy='6' RotationPolicy='2'><FinishSize ord='0' x='210' y='297'/></Layout>", L"210 297",
-         L"ClipToMaxPage", L"RotateCounterClockwise"},
-        {"<Layout SizePolicy='0' RotationPolicy='1'><FinishSize ord='1' x='210' y='297'/></Layout>", L"0 0", L"",
-         L"RotateClockwise"},
-        {"<Layout SizePolicy='5' ImpositionMode='1'/>", L"0 0", nullptr, nullptr},
-        {"<Layout SizePolicy='2' RotationPolicy='0'/>", L"", nullptr, nullptr},
-    };
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.settings);
-        Imposed t(buildTemplateTicket({1, 0, 2, 2, true}), c.settings);
-        ASSERT_EQ(t.result, LD_OK);
-        for (int s = 0; s < 2; ++s) {
-            vElement objects = children(t.side(s), L"ContentObject");
-            ASSERT_EQ(objects.size(), 2u);
-            for (const KElement& object : objects) {
-                EXPECT_EQ(object.GetAttribute(L"TrimSize"), c.trim);
-                KElement policy = object.GetElement(L"FitPolicy");
-                ASSERT_EQ(policy.isNull(), c.size == nullptr);
-                if (!c.size) continue;
-                EXPECT_EQ(policy.GetAttribute(L"SizePolicy"), c.size);
-                EXPECT_EQ(policy.GetAttribute(L"RotatePolicy"), c.rotate);
-            }
-        }
-    }
-}
-
-TEST(AutoImposeRewrite, SheetRangesByRangeType) {
-    struct Case {
-        const char* settings;
-        const wchar_t* partKey;  // on the output run list's link; SetIndex: on the document link
-        std::vector<WString> parts;
-        const wchar_t* firstRunPages;
-    };
-    const std::string ranges = "Count='2'><Range StartIndex='1' EndIndex='2'/><Range StartIndex='5' EndIndex='5'/>";
-    const Case cases[] = {
-        {"<RangeInfo Type='1' TotalCount='6'/>", L"SheetIndex", {L"1", L"3", L"5"}, L"0 ~ -1"},
-        {"<RangeInfo Type='2' TotalCount='5'/>", L"SheetIndex", {L"0", L"2", L"4"}, L"0 ~ -1"},
-        {"<RangeInfo Type='3' ", nullptr, {}, L"0 ~ 1 4"},
-        {"<RangeInfo Type='4' ", L"SheetIndex", {L"0 ~ 1", L"4"}, L"0 ~ -1"},
-        {"<RangeInfo Type='5' ", L"SetIndex", {L"0 ~ 1", L"4"}, L"0 ~ -1"},
-        {"<RangeInfo Type='9' TotalCount='4'/>", L"SheetIndex", {}, L"0 ~ -1"},
-    };
-    SchemaCheck schema;
-    for (const Case& c : cases) {
-        std::string settings = c.settings;
-        if (settings.back() == ' ') settings += ranges + "</RangeInfo>";
-        SCOPED_TRACE(settings);
-        Imposed t(buildTemplateTicket(), settings);
-        ASSERT_EQ(t.result, LD_OK);
-        EXPECT_EQ(t.root.GetMatchingResource(L"RunList", 10).GetElement(L"RunList").GetAttribute(L"Pages"),
-                  c.firstRunPages);
-        JDFResourceLink output = t.root.GetMatchingLink(L"RunList", 2);
-        const bool onOutput = c.partKey && WString(c.partKey) == L"SheetIndex";
-        ASSERT_EQ(output.isNull(), !onOutput);
-        if (onOutput) {
-            EXPECT_EQ(output.GetTarget().GetAttribute(L"PartIDKeys"), L"SheetIndex");
-            EXPECT_EQ(output.GetTarget().GetAttribute(L"Status"), L"Available");
-        }
-        KElement link = onOutput ? KElement(output) : KElement(t.root.GetMatchingLink(L"RunList", 10));
-        if (c.partKey) {
-            EXPECT_EQ(attributeOf(children(link, L"Part"), c.partKey), c.parts);
-        }
-        schema.add(t.ticket);
-    }
+    EXPECT_EQ(t.result, LD_OK);
+    EXPECT_EQ(vorlan::jobstore::JobAttributeStore(store.path()).get(31, "ignore_record_ progress"), "1");
+    EXPECT_NE(vorlan::test::readFile(t.ticket).find("xmlns:KAV=\"http://www.vorlan.org/JDF/1.0\""), std::string::npos);
 }
 
 TEST(AutoImposeRewrite, FailureLeavesTheTicketByteIdentical) {
-    JDFDoc noLayout = buildTemplateTicket();
-    noLayout.GetJDFRoot().GetMatchingLink(L"Layout", 3).DeleteNode();
-    JDFDoc noSignature = buildTemplateTicket();
-    KElement signature = noSignature.GetJDFRoot().GetMatchingResource(L"Layout", 3).GetElement(L"Layout");
-    signature.DeleteNode();
-    JDFDoc danglingLink = buildTemplateTicket();
-    danglingLink.GetJDFRoot().GetMatchingLink(L"RunList", 10).SetAttribute(L"rRef", L"nowhere");
-    const std::string texts[] = {noLayout.ToString(), noSignature.ToString(), danglingLink.ToString(),
-                                 "<JDF><ResourcePool>", "<NotJDF ID='x' Type='Imposition' Status='Ready'/>"};
+    auto without = [](const char* query) {
+        JDF::JDFDoc doc = autoimpose_test::buildTemplateTicket();
+        pugi::xml_node gone = doc.GetRoot().node().select_node(query).node();
+        gone.parent().remove_child(gone);
+        return doc.ToString();
+    };
+    const std::string texts[] = {without("//LayoutLink"), without("/JDF/ResourcePool/Layout/Layout"),
+                                 without("/JDF/ResourcePool/RunList"), "<JDF><ResourcePool>",
+                                 "<NotJDF ID='x' Type='Imposition' Status='Ready'/>"};
     vorlan::test::TempDir dir;
     autoimpose_test::writeSettings(dir / "s.xml", "<RangeInfo Type='1' TotalCount='4'/>");
     for (const std::string& text : texts) {
         vorlan::test::writeFile(dir / "t.jdf", text);
-        LD_JDF worker;
-        EXPECT_EQ(worker.JDF_AutoImposition((dir / "s.xml").c_str(), (dir / "t.jdf").c_str()), LD_FAILED);
+        EXPECT_EQ(LD_JDF().JDF_AutoImposition((dir / "s.xml").c_str(), (dir / "t.jdf").c_str()), LD_FAILED);
         EXPECT_EQ(vorlan::test::readFile(dir / "t.jdf"), text);
     }
     LD_JDF worker;
     EXPECT_EQ(worker.JDF_AutoImposition((dir / "s.xml").c_str(), ""), LD_FAILED);
     EXPECT_EQ(worker.JDF_AutoImposition(nullptr, (dir / "missing.jdf").c_str()), LD_FAILED);
     EXPECT_EQ(worker.JDF_GetLastErrorCode(), LD_FAILED);
-    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(dir.path()), {}), 2);  // no temporary left
+    EXPECT_EQ(std::distance(fs::directory_iterator(dir.path()), {}), 2);  // no temporary file left
 }
 
 TEST(AutoImposeCli, PrintsWhatChanged) {
     vorlan::test::TempDir dir;
-    ASSERT_TRUE(buildTemplateTicket().Write2File(WString((dir / "t.jdf").string())));
+    ASSERT_TRUE(autoimpose_test::buildTemplateTicket().Write2File(JDF::WString((dir / "t.jdf").string())));
     autoimpose_test::writeSettings(dir / "s.xml", "<Layout><Binding Type='10'/></Layout>");
     const std::string command = std::string(VORLAN_CLI_PATH) + " autoimpose ";
     std::string output;
