@@ -77,7 +77,7 @@ void setTrimSizesAndFitPolicies(TicketRewrite& t) {
     } else if (auto finish = s.FinishSize.find(0); finish != s.FinishSize.end()) {
         trim = JDF::JDFXYPair(finish->second.first, finish->second.second);
     }
-    if (s.ImpositionMode) s.sizePolicy = 0;  // the engine imposes at the finished size itself
+    if (s.ImpositionMode) s.sizePolicy = 0;  // in imposition mode only a rotate policy is written
     const bool fit = s.rotatePolicy != 1 || s.sizePolicy != 0;
     for (const JDF::KElement& side : t.sides()) {
         for (const JDF::KElement& element : contentObjects(side)) {
