@@ -13,7 +13,7 @@ namespace fs = std::filesystem;
 
 namespace {
 
-// Run lists by link, side partitions by position, and the first side's objects.
+// Run lists by link, side partitions by position, and the content objects of the first two sides.
 const std::string kDocument = "/JDF/ResourcePool/RunList[@ID=//RunListLink[@ProcessUsage='Document']/@rRef]";
 const std::string kMarks = "/JDF/ResourcePool/RunList[@ID=//RunListLink[@ProcessUsage='Marks']/@rRef]";
 const std::string kOutputLink = "//RunListLink[@Usage='Output']";
