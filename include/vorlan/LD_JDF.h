@@ -62,7 +62,8 @@ public:
     void JDF_Release(long long what);                                // does nothing
     void JDF_ChangeSourceFileNameInJDF(wchar_t* from, wchar_t* to);  // does nothing
     LDError JDF_GetLastErrorCode();
-    // Rewrites the ticket at jdfPath into an imposed layout from the settings file.
+    // Rewrites the ticket at jdfPath in place into an imposed layout from the settings file:
+    // LD_OK when it was rewritten, else LD_FAILED with the ticket file as it was.
     LDError JDF_AutoImposition(const char* settingsPath, const char* jdfPath);
 
     // ---- Input resolution and path utilities ------------------------------------------------

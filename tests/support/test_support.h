@@ -45,6 +45,11 @@ std::string readFile(const std::filesystem::path& file);
 int runCommand(const std::string& command, std::string* output = nullptr);
 // True when a program is on PATH.
 bool haveProgram(const std::string& name);
+// Validates JDF files against the JDF 1.8 schema in one xmllint call. Returns the names of the
+// files that do not validate (empty when all do); *report receives xmllint's messages when given.
+// Fails the calling test when the corpus schema or xmllint is missing.
+std::vector<std::string> filesFailingJdfSchema(const std::vector<std::filesystem::path>& files,
+                                               std::string* report = nullptr);
 // A minimal valid one-page PDF (optionally with a content stream) as bytes.
 std::string minimalPdf(const std::string& content = "0 0 m 10 10 l S");
 // A PDF of the given object bodies, numbered from 1 (object 1 is the catalog), with a
