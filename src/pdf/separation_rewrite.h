@@ -10,11 +10,10 @@
 // colorants, so that they paint nothing.
 #pragma once
 
-#include <qpdf/QPDF.hh>
-
 #include <string>
 #include <vector>
 
+class QPDF;
 struct ZippedJDFFileSystem;
 
 namespace vorlan::pdf {
