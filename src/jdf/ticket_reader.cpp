@@ -231,6 +231,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
     t.processNode = JDF::JDFNode();
     t.layoutElement = t.interpretingParamsElement = t.renderingParamsElement = JDF::KElement();
     t.digitalPrintingParamsElement = t.runListElement = JDF::KElement();
+    t.ticketHasLayout = false;
 
     try {
         t.parser = std::make_unique<JDF::JDFParser>();
@@ -267,6 +268,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
         // The layout, or one injected from the run lists.
         if (!t.processNode.isNull()) {
             t.layoutElement = firstBelow(t.rootNode, L"Layout", L"*");
+            t.ticketHasLayout = !t.layoutElement.isNull();
             if (t.layoutElement.isNull()) {
                 lastError = LD_JDF_RESOURCE_MISSING;
                 JDF::JDFLayout injected;
@@ -277,6 +279,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
                 }
             }
         } else {
+            t.ticketHasLayout = !firstBelow(t.rootNode, L"Layout", L"*").isNull();
             JDF::JDFLayout injected;
             changed = true;
             if (injectLayoutNode(t.rootNode, injected)) {
