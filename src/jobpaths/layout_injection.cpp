@@ -97,10 +97,13 @@ void LayoutInjectionProcessingJdf::locateFile(Part& part, std::wstring url) cons
     std::free(native);
 }
 
-int32_t LayoutInjectionProcessingJdf::countPages(Part& part) {
-    if (part.counted || part.localPath.empty()) return part.run->NPage;
-    part.counted = true;
-    return getPDFPageCount(worker_->zipFileSystem, part.localPath.c_str());
+int32_t LayoutInjectionProcessingJdf::countPages(const Part& part) {
+    if (part.localPath.empty()) return part.run->NPage;
+    auto known = pageCounts_.find(part.localPath);
+    if (known != pageCounts_.end()) return known->second;
+    int32_t pages = getPDFPageCount(worker_->zipFileSystem, part.localPath.c_str());
+    pageCounts_.emplace(part.localPath, pages);
+    return pages;
 }
 
 bool LayoutInjectionProcessingJdf::buildRows() {

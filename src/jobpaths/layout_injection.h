@@ -10,6 +10,7 @@
 
 #include <memory>
 #include <string>
+#include <unordered_map>
 #include <vector>
 
 #include "platform/jdf/jdf.h"
@@ -34,7 +35,6 @@ private:
         std::unique_ptr<LD_Run> run;
         JDF::WString url;       // the file URL the new ticket gives it
         std::string localPath;  // the file on this machine; empty when the URL names none
-        bool counted = false;   // its PDF's pages have been counted
     };
     // One content page: the part and the page of its file.
     struct Row {
@@ -48,7 +48,9 @@ private:
     // data folder; a file URL with a path names that file; any other URL is kept as written
     // and names no file here.
     void locateFile(Part& part, std::wstring url) const;
-    int32_t countPages(Part& part);
+    // The page count of the part's PDF (0 when it cannot be read); each file is read once. A part
+    // naming no file here keeps its NPage.
+    int32_t countPages(const Part& part);
     bool buildRows();
     LDError writeTicket();
 
@@ -62,4 +64,5 @@ private:
     std::vector<Part*> content_, dieOnly_, dieWithContent_;
     std::vector<Row> rows_;
     std::vector<bool> selected_;  // one bit per row
+    std::unordered_map<std::string, int32_t> pageCounts_;  // by local path
 };
