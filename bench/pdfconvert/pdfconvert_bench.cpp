@@ -24,8 +24,6 @@
 #include <vector>
 
 #include "pdf/separation_layers.h"
-#include "vorlan/vorlan.h"
-#include "vorlan/LD_JDF.h"
 #include "pdf/separation_rewrite.h"
 #include "pdf_bench_builder.h"
 
@@ -112,36 +110,33 @@ Measure qpdfLinearize(const fs::path& in, const fs::path& out) {
     });
 }
 
-// A bare-PDF job without layer mode: the first content object switches no separation on and the
-// die is Silver, so the job writes three variants (Gold and Silver dropped; Gold dropped; Silver
-// alone).
-int pdfOnlyJob(const fs::path& dir, const fs::path& in) {
+// A bare-PDF job without layer mode, run by the command-line host in a process of its own (as
+// qpdf is), so that its peak memory is the job's alone: the first content object switches no
+// separation on and the die is Silver, so the job writes three variants (Gold and Silver
+// dropped; Gold dropped; Silver alone).
+Measure pdfOnlyJob(const fs::path& dir, const fs::path& in) {
     const fs::path description = dir / "job1.impinfo";
-    FILE* out = std::fopen(description.c_str(), "wb");
-    if (!out) return 1;
-    std::fputs("<OptionalContentGroupData DefaultLayerMode=\"false\">"
-               "<OptionalLayer OCGName=\"Gold\" isSep=\"true\"/><OptionalLayer OCGName=\"Silver\" isSep=\"true\"/>"
-               "<Versions><InternalVersion><Surface><ContentObject index=\"0\" SepNameOn=\"\"/></Surface>"
-               "</InternalVersion></Versions>"
-               "<DieCut enable=\"true\"><Surface index=\"0\" dieSepInternalNames=\"Silver\"/></DieCut>"
-               "</OptionalContentGroupData>", out);
-    std::fclose(out);
+    if (FILE* out = std::fopen(description.c_str(), "wb")) {
+        std::fputs("<OptionalContentGroupData DefaultLayerMode=\"false\">"
+                   "<OptionalLayer OCGName=\"Gold\" isSep=\"true\"/><OptionalLayer OCGName=\"Silver\" isSep=\"true\"/>"
+                   "<Versions><InternalVersion><Surface><ContentObject index=\"0\" SepNameOn=\"\"/></Surface>"
+                   "</InternalVersion></Versions>"
+                   "<DieCut enable=\"true\"><Surface index=\"0\" dieSepInternalNames=\"Silver\"/></DieCut>"
+                   "</OptionalContentGroupData>",
+                   out);
+        std::fclose(out);
+    }
     setenv("VORLAN_JOB_STORE", (dir / "store").c_str(), 1);
-    LD_JDF attributes;
-    attributes.jobNumber = 1;
-    if (!attributes.setJobAttribute("KVPrintDieLine", "True")) return 1;
-    struct Host {
-        fs::path dir;
-        int n = 0;
-    } host{dir};
-    auto newPath = [](char* buffer, int size, void* user) {
-        auto* h = static_cast<Host*>(user);
-        std::snprintf(buffer, static_cast<size_t>(size), "%s/variant-%d.pdf", h->dir.c_str(), ++h->n);
-        return 0;
-    };
-    std::string ticket = (dir / "job.jdf").string();
-    return vorlan_consume_job(in.c_str(), description.c_str(), ticket.data(), dir.c_str(), "All", nullptr, newPath,
-                              &host);
+    inChild([] {
+        execl(VORLAN_CLI, VORLAN_CLI, "job-attr", "1", "KVPrintDieLine", "True", static_cast<char*>(nullptr));
+        return 127;
+    });
+    return inChild([&] {
+        const std::string folder = dir.string(), out = (dir / "out").string(), ticket = (dir / "job.jdf").string();
+        execl(VORLAN_CLI, VORLAN_CLI, "consume", "--impinfo", description.c_str(), "--job-folder", folder.c_str(),
+              "--out-dir", out.c_str(), in.c_str(), ticket.c_str(), static_cast<char*>(nullptr));
+        return 127;
+    });
 }
 
 }  // namespace
@@ -170,7 +165,7 @@ int main(int argc, char** argv) {
         Measure w = inChild([&] {
             return vorlan::pdf::rewriteSeparations(nullptr, in.c_str(), (dir / "rewritten.pdf").c_str(), keepList, true);
         });
-        Measure j = inChild([&] { return pdfOnlyJob(dir, in); });
+        Measure j = pdfOnlyJob(dir, in);
         if (q.status || c.status || w.status || j.status)
             std::fprintf(stderr, "a run failed: qpdf %d, conversion %d, rewriting %d, PDF-only job %d\n", q.status,
                          c.status, w.status, j.status);

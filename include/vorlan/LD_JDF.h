@@ -62,7 +62,8 @@ public:
     void JDF_Release(long long what);                                // does nothing
     void JDF_ChangeSourceFileNameInJDF(wchar_t* from, wchar_t* to);  // does nothing
     LDError JDF_GetLastErrorCode();
-    // Rewrites the ticket at jdfPath into an imposed layout from the settings file.
+    // Rewrites the ticket at jdfPath in place into an imposed layout from the settings file:
+    // LD_OK when it was rewritten, else LD_FAILED with the ticket file as it was.
     LDError JDF_AutoImposition(const char* settingsPath, const char* jdfPath);
 
     // ---- Input resolution and path utilities ------------------------------------------------
@@ -97,9 +98,18 @@ public:
     wchar_t* getAttributeValue(_kvXmlNode* node, const wchar_t* attributeName);
 
     // ---- Automatic version description --------------------------------------------------------
+    // Die inks of every content PDF (page inks the die library lists as separations) into both
+    // ink maps; a PDF without page inks gets no entry. True when some PDF has die inks; false
+    // also when the library cannot be read.
     bool populateKAVDieLibInks();
+    // The Esko XMP ink lists of every content PDF into the maps (an unreadable PDF gives empty
+    // lists); sets eskoInksFound when some PDF has technical-version inks. Always true.
     bool populateEskoTechInks();
+    // Writes the description made from the ink maps and the layout to path (CR LF lines). Always
+    // true: a file that could not be written shows when it is read back.
     bool generateImpInfoFile(const char* path);
+    // Reads the file into a new zeroed buffer 16 bytes longer than the file (free() it). False,
+    // with a message on standard error, when it cannot be opened or the buffer not allocated.
     bool parseImpInfoFile(const char* path, char** buffer, long* length);
 
     // ---- Page ranges, expansion, die cuts, writer ---------------------------------------------
@@ -294,8 +304,10 @@ public:
     std::vector<XMLSurfaceData*> surfaceVersions;
     int32_t jobNumber = -1;
     bool printDieLine = false;
-    std::map<LD_PDF*, std::vector<wchar_t*>> technicalInkMap;
-    std::map<LD_PDF*, std::vector<wchar_t*>> dieInkMap;
+    // Inks of each content PDF found for the automatic description (UTF-8 names as the PDF
+    // spells them): those to switch off, and those that make the die line.
+    std::map<LD_PDF*, std::vector<std::string>> technicalInkMap;
+    std::map<LD_PDF*, std::vector<std::string>> dieInkMap;
     wchar_t* dataPath = nullptr;
     bool eskoInksFound = false;
     bool dieCutDefined = false;  // die-cut state flag

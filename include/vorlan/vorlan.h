@@ -46,7 +46,9 @@ VORLAN_API int vorlan_consume_job(const char* dataFile, const char* impinfoPath,
 /* True when path is a well-formed XML file whose root is OptionalContentGroupData (any case). */
 VORLAN_API bool vorlan_is_valid_job(const char* path);
 
-/* Rewrites the ticket at jdfPath into an imposed layout from the settings file. Returns 0 or 1. */
+/* Rewrites the ticket at jdfPath in place into an imposed layout from the auto-impose settings file
+   (defaults where it is missing or unreadable). Returns 0 when the ticket was rewritten, else 1, and
+   then the ticket file is as it was. The callbacks are kept and not called. */
 VORLAN_API int vorlan_autoimp(const char* settingsPath, const char* jdfPath, ProgressCallback progress,
                               FilePathCallback filePath);
 

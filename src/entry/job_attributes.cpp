@@ -1,5 +1,6 @@
 // Job attributes on the print server: each call connects, opens a session, makes one request
 // and closes everything it opened.
+#include "entry/job_attributes.h"
 #include "platform/jobstore/job_client.h"
 #include "vorlan/LD_JDF.h"
 
@@ -43,9 +44,13 @@ bool LD_JDF::getJobAttribute(const char* name, char** value) {
     });
 }
 
-bool LD_JDF::setJobAttribute(const char* name, const char* value) {
+bool vorlan::setJobAttributeOf(int jobNumber, const char* name, const char* value) {
     if (!name || !value) return false;
     return withJobSession(jobNumber, [&](JOBM_Session* session, int64_t jobId) {
         return JOBM_setJobAttribute(session, jobId, name, value, 0);
     });
+}
+
+bool LD_JDF::setJobAttribute(const char* name, const char* value) {
+    return vorlan::setJobAttributeOf(jobNumber, name, value);
 }

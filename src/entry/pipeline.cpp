@@ -3,12 +3,15 @@
 #include <cstdlib>
 #include <cstring>
 #include <filesystem>
+#include <memory>
+#include <string>
 
 #include "jdf/ticket_handles.h"
 #include "jobpaths/layout_injection.h"
 #include "jobpaths/pdf_only.h"
 #include "jobpaths/spot_mode.h"
 #include "pdf/zipped_jdf_file_system.h"
+#include "platform/os/file_system.h"
 #include "platform/os/text.h"
 #include "vorlan/LD_JDF.h"
 
@@ -114,18 +117,18 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
             generate = eskoInksFound;
         }
         if (generate) {
-            char generatedPath[256] = {};
-            std::snprintf(generatedPath, sizeof generatedPath, "%s/job%d.impinfo", jobFolder ? jobFolder : ".",
-                          jobNumber);
-            generateImpInfoFile(generatedPath);
+            // The host may keep its own description in the job folder under the job's name, so
+            // the generated one goes to a file of its own, removed on every way out.
+            vorlan::os::TemporaryFile file(jobFolder ? jobFolder : ".", ".job" + std::to_string(jobNumber) + ".impinfo.");
+            generateImpInfoFile(file.path().c_str());
             char* generated = nullptr;
             long generatedLength = 0;
-            parseImpInfoFile(generatedPath, &generated, &generatedLength);
-            std::remove(generatedPath);
+            parseImpInfoFile(file.path().c_str(), &generated, &generatedLength);
+            file.remove();
+            std::unique_ptr<char, decltype(&std::free)> owned(generated, &std::free);
             if (generated) {
                 described = true;
                 parsed = parseXMLBuffer(generated, generatedLength, jobHasTicket, jobFolder);
-                std::free(generated);
             }
         }
     }

@@ -53,10 +53,8 @@ void LD_JDF::releaseDieCuts() {
 void LD_JDF::releaseLayerData() {
     for (auto& [pdf, layers] : layerDataMap) delete layers;
     layerDataMap.clear();
-    for (auto* inks : {&technicalInkMap, &dieInkMap}) {
-        for (auto& [pdf, names] : *inks) LD_FreeTextList(names);
-        inks->clear();
-    }
+    technicalInkMap.clear();
+    dieInkMap.clear();
 }
 
 void LD_JDF::releaseJobRecords() {

@@ -1,8 +1,6 @@
 // Byte-slice editing of parsed content.
 #include "pdf/content_edit.h"
 
-#include "pdf/stream_compression.h"
-
 #include <qpdf/QPDFPageObjectHelper.hh>
 
 #include <algorithm>
@@ -29,10 +27,10 @@ const std::vector<ContentElement>* siblingsOf(const std::vector<ContentElement>&
     return nullptr;
 }
 
-void markImagesOptional(const ContentElement& e, QPDFObjectHandle ocg) {
+void markImagesOptional(DocumentEdits& edits, const ContentElement& e, QPDFObjectHandle ocg) {
     QPDFObjectHandle image = e.object;  // a handle copy: qpdf's accessors are not const
-    if (e.kind == ElementKind::Image && image.isStream()) image.getDict().replaceKey("/OC", ocg);
-    for (const ContentElement& c : e.children) markImagesOptional(c, ocg);
+    if (e.kind == ElementKind::Image && image.isStream()) edits.setKey(image, "/OC", ocg);
+    for (const ContentElement& c : e.children) markImagesOptional(edits, c, ocg);
 }
 
 QPDFObjectHandle renamed(QPDFObjectHandle name, const std::function<bool(const std::string&)>& affected,
@@ -114,30 +112,29 @@ QPDFObjectHandle colorantsToNone(QPDFObjectHandle colourSpace,
 }
 
 void ContentEditor::replace(size_t begin, size_t end, std::string text) {
-    edits_.push_back({begin, end, std::move(text), 2, static_cast<int>(edits_.size())});
+    changes_.push_back({begin, end, std::move(text), 2, static_cast<int>(changes_.size())});
 }
 
 void ContentEditor::insert(size_t at, std::string text, bool closing) {
-    edits_.push_back({at, at, std::move(text), closing ? 0 : 1, static_cast<int>(edits_.size())});
+    changes_.push_back({at, at, std::move(text), closing ? 0 : 1, static_cast<int>(changes_.size())});
 }
 
 QPDFObjectHandle ContentEditor::ownResources() {
     QPDFObjectHandle owner = content_.owner;
-    QPDFObjectHandle resources;
-    if (owner.isStream()) {  // a form: its own dictionary, made when missing
-        resources = owner.getDict().getKey("/Resources");
-        if (!resources.isDictionary()) {
-            resources = content_.resources.isDictionary() ? content_.resources.shallowCopy()
-                                                          : QPDFObjectHandle::newDictionary();
-            owner.getDict().replaceKey("/Resources", resources);
+    QPDFObjectHandle resources = edits_.key(owner, "/Resources");
+    if (!resources.isDictionary()) {
+        // A form gets a dictionary of its own: a copy of what it used; a page gets a copy of
+        // the resources it inherits, before they change.
+        QPDFObjectHandle used = content_.resources;
+        if (!owner.isStream()) {
+            try {
+                used = QPDFPageObjectHelper(owner).getAttribute("/Resources", false);
+            } catch (const std::exception&) {
+                used = QPDFObjectHandle::newNull();
+            }
         }
-    } else {
-        // A page: inherited resources are copied onto the page before they change.
-        resources = QPDFPageObjectHelper(owner).getAttribute("/Resources", true);
-        if (!resources.isDictionary()) {
-            resources = QPDFObjectHandle::newDictionary();
-            owner.replaceKey("/Resources", resources);
-        }
+        resources = used.isDictionary() ? used.shallowCopy() : QPDFObjectHandle::newDictionary();
+        edits_.setKey(owner, "/Resources", resources);
     }
     content_.resources = resources;
     return resources;
@@ -148,23 +145,24 @@ std::string ContentEditor::resourceName(const char* category, QPDFObjectHandle o
     auto known = names_.find(key);
     if (known != names_.end()) return known->second;
     QPDFObjectHandle resources = ownResources();
-    QPDFObjectHandle dict = resources.getKey(category);
+    QPDFObjectHandle dict = edits_.key(resources, category);
     // A dictionary shared with other contents gains the key as well: adding a name changes no
     // other content's meaning, and keeping it shared keeps names resolved once per document.
     if (!dict.isDictionary()) {
         dict = QPDFObjectHandle::newDictionary();
-        resources.replaceKey(category, dict);
+        edits_.setKey(resources, category, dict);
     }
+    const std::map<std::string, QPDFObjectHandle> listed = edits_.items(dict);
     std::string name;
-    for (const auto& [itemKey, item] : dict.ditems())
+    for (const auto& [itemKey, item] : listed)
         if (item.isSameObjectAs(object)) {
             name = itemKey;
             break;
         }
     const std::string stem = std::string("/") + prefix;
     for (int n = 1; name.empty(); ++n)
-        if (!dict.hasKey(stem + std::to_string(n))) name = stem + std::to_string(n);
-    dict.replaceKey(name, object);
+        if (!listed.count(stem + std::to_string(n))) name = stem + std::to_string(n);
+    edits_.setKey(dict, name, object);
     std::string token = nameToken(name);
     names_[key] = token;
     return token;
@@ -177,7 +175,7 @@ bool ContentEditor::wrapInOptionalContent(const ContentElement& first, const Con
     const std::string name = resourceName("/Properties", ocg, "oc");
     insert(first.begin, "/OC " + name + " BDC\n", false);
     insert(last.end, "\nEMC\n", true);
-    for (const ContentElement* e = &first; e <= &last; ++e) markImagesOptional(*e, ocg);
+    for (const ContentElement* e = &first; e <= &last; ++e) markImagesOptional(edits_, *e, ocg);
     return true;
 }
 
@@ -209,7 +207,7 @@ void ContentEditor::remove(const ContentElement& e) {
 
 std::string ContentEditor::result() const {
     std::vector<const Edit*> ordered;
-    for (const Edit& e : edits_) ordered.push_back(&e);
+    for (const Edit& e : changes_) ordered.push_back(&e);
     std::stable_sort(ordered.begin(), ordered.end(), [](const Edit* a, const Edit* b) {
         if (a->begin != b->begin) return a->begin < b->begin;
         if (a->rank != b->rank) return a->rank < b->rank;
@@ -217,7 +215,7 @@ std::string ContentEditor::result() const {
     });
     const std::string& src = content_.bytes;
     std::string out;
-    out.reserve(src.size() + 64 * edits_.size());
+    out.reserve(src.size() + 64 * changes_.size());
     size_t at = 0;
     for (const Edit* e : ordered) {
         const size_t begin = std::min(e->begin, src.size());
@@ -230,16 +228,16 @@ std::string ContentEditor::result() const {
     return out;
 }
 
-void ContentEditor::apply(QPDF& pdf) {
-    if (edits_.empty()) return;
+void ContentEditor::apply(QPDF& pdf, StreamCompressor& compressor) {
+    if (changes_.empty()) return;
     std::string bytes = result();
     if (content_.owner.isStream()) {
-        setCompressedStreamData(content_.owner, bytes);
+        edits_.setStreamData(content_.owner, compressor.pack(bytes));
     } else {
-        content_.owner.replaceKey("/Contents", newCompressedStream(pdf, bytes));
+        edits_.setKey(content_.owner, "/Contents", compressor.newStream(pdf, bytes));
     }
     content_.bytes = std::move(bytes);
-    edits_.clear();
+    changes_.clear();
 }
 
 }  // namespace vorlan::pdf

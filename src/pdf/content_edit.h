@@ -11,12 +11,17 @@
 #include <vector>
 
 #include "pdf/content_tree.h"
+#include "pdf/document_edits.h"
+#include "pdf/stream_compression.h"
 
 namespace vorlan::pdf {
 
 class ContentEditor {
 public:
-    explicit ContentEditor(Content& content) : content_(content) {}
+    // Changes to objects (resources, /Contents, stream data) go through `edits`; without it they
+    // are made at once.
+    explicit ContentEditor(Content& content, DocumentEdits* edits = nullptr)
+        : content_(content), edits_(edits ? *edits : direct_) {}
 
     // Puts the sibling elements first..last (same parent, first not after last) into the optional
     // content group `ocg`: "/OC /<name> BDC" before them and "EMC" after them, the group listed
@@ -42,12 +47,13 @@ public:
     // Dictionaries shared with other contents only gain keys, so their users see no change.
     std::string resourceName(const char* category, QPDFObjectHandle object, const char* prefix);
 
-    bool edited() const { return !edits_.empty(); }
+    bool edited() const { return !changes_.empty(); }
     // The content with every edit applied.
     std::string result() const;
-    // Writes the result into the owner: a page gets one new /Contents stream (streams shared with
-    // other pages stay untouched), a form XObject gets new stream data. Nothing happens without edits.
-    void apply(QPDF& pdf);
+    // Writes the result into the owner, compressed by `compressor`: a page gets one new /Contents
+    // stream (streams shared with other pages stay untouched), a form XObject gets new stream
+    // data. Nothing happens without edits.
+    void apply(QPDF& pdf, StreamCompressor& compressor);
 
 private:
     struct Edit {
@@ -60,7 +66,9 @@ private:
     QPDFObjectHandle ownResources();
 
     Content& content_;
-    std::vector<Edit> edits_;
+    DocumentEdits direct_;
+    DocumentEdits& edits_;
+    std::vector<Edit> changes_;
     std::map<std::pair<std::string, QPDFObjGen>, std::string> names_;
 };
 

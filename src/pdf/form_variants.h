@@ -19,7 +19,9 @@ namespace vorlan::pdf {
 
 class FormVariants {
 public:
-    explicit FormVariants(QPDF& pdf) : pdf_(pdf) {}
+    // Changes to existing objects go through `edits` (made at once without it).
+    FormVariants(QPDF& pdf, StreamCompressor& compressor, DocumentEdits* edits = nullptr)
+        : pdf_(pdf), compressor_(compressor), edits_(edits ? *edits : direct_) {}
 
     // The stream that carries `bytes` for one use of `form`, whose unedited content is `original`:
     // the form itself when the bytes are its first variant (or the first variant is claimed
@@ -32,10 +34,22 @@ public:
     void editUse(const ContentElement& e, ContentEditor& parent,
                  const std::function<void(Content&, ContentEditor&)>& edit);
 
-    // Writes the claimed variants into the original forms (unfiltered; the writer compresses them).
+    // The same for edits made in a document other than the one the form was parsed in (another
+    // opening of the same file): `form` is this document's form and `parentResources` the
+    // resources, here, of the content that uses it. `edit` gets a view of the parsed form whose
+    // owner and resources are this document's (bytes as parsed, no elements) and the parsed form
+    // with its elements.
+    void editUse(const ContentElement& e, QPDFObjectHandle form, QPDFObjectHandle parentResources,
+                 ContentEditor& parent, const std::function<void(Content&, const Content&, ContentEditor&)>& edit);
+
+    // Writes the claimed variants into the original forms.
     void finish();
 
 private:
+    // Points the use at `target` (made by `make` for the parsed form once) in the parent content.
+    void pointUse(const ContentElement& e, QPDFObjectHandle form, ContentEditor& parent,
+                  const std::function<QPDFObjectHandle()>& make);
+
     struct Entry {
         QPDFObjectHandle form;
         std::string claimed;
@@ -43,6 +57,9 @@ private:
         std::map<std::string, QPDFObjectHandle> copies;
     };
     QPDF& pdf_;
+    StreamCompressor& compressor_;
+    DocumentEdits direct_;
+    DocumentEdits& edits_;
     std::map<QPDFObjGen, Entry> entries_;
     std::map<const Content*, QPDFObjectHandle> targets_;  // what each parsed form became
 };

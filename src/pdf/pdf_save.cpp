@@ -24,10 +24,24 @@ std::string escapedName(const std::string& name) {
     return out;
 }
 
+// The inverse of escapedName: every "#23" becomes '#' again.
+std::string unescapedName(const std::string& name) {
+    std::string out;
+    out.reserve(name.size());
+    for (size_t i = 0; i < name.size(); ++i) {
+        out += name[i];
+        if (name.compare(i, 3, "#23") == 0) i += 2;
+    }
+    return out;
+}
+
+using NameMap = std::string (*)(const std::string&);
+
 bool needsEscape(const std::string& name) { return name.find('#') != std::string::npos; }
 
-// Rewrites names inside one object's direct parts; indirect references are left to their own visit.
-void protectDirect(QPDFObjectHandle root) {
+// Renames names (values and keys) that hold '#' inside one object's direct parts; indirect
+// references are left to their own visit.
+void renameDirect(QPDFObjectHandle root, NameMap rename) {
     std::vector<QPDFObjectHandle> stack{root};
     while (!stack.empty()) {
         QPDFObjectHandle o = stack.back();
@@ -40,7 +54,7 @@ void protectDirect(QPDFObjectHandle root) {
                 if (needsEscape(key)) renamedKeys.push_back(key);
                 if (value.isIndirect()) continue;
                 if (value.isName() && needsEscape(value.getName())) {
-                    renamedValues.emplace_back(key, QPDFObjectHandle::newName(escapedName(value.getName())));
+                    renamedValues.emplace_back(key, QPDFObjectHandle::newName(rename(value.getName())));
                 } else if (value.isDictionary() || value.isArray()) {
                     stack.push_back(value);
                 }
@@ -49,7 +63,7 @@ void protectDirect(QPDFObjectHandle root) {
             for (const std::string& key : renamedKeys) {
                 QPDFObjectHandle value = o.getKey(key);
                 o.removeKey(key);
-                o.replaceKey(escapedName(key), value);
+                o.replaceKey(rename(key), value);
             }
         } else if (o.isArray()) {
             const int n = o.getArrayNItems();
@@ -57,7 +71,7 @@ void protectDirect(QPDFObjectHandle root) {
                 QPDFObjectHandle item = o.getArrayItem(i);
                 if (item.isIndirect()) continue;
                 if (item.isName() && needsEscape(item.getName())) {
-                    o.setArrayItem(i, QPDFObjectHandle::newName(escapedName(item.getName())));
+                    o.setArrayItem(i, QPDFObjectHandle::newName(rename(item.getName())));
                 } else if (item.isDictionary() || item.isArray()) {
                     stack.push_back(item);
                 }
@@ -66,14 +80,18 @@ void protectDirect(QPDFObjectHandle root) {
     }
 }
 
-}  // namespace
-
-void protectNumberSignsInNames(QPDF& pdf) {
+void renameNames(QPDF& pdf, NameMap rename) {
     // A name object held directly as an indirect object cannot be renamed in place; such names
     // are practically unknown and stay as they are.
-    protectDirect(pdf.getTrailer());
-    for (QPDFObjectHandle o : pdf.getAllObjects()) protectDirect(o);
+    renameDirect(pdf.getTrailer(), rename);
+    for (QPDFObjectHandle o : pdf.getAllObjects()) renameDirect(o, rename);
 }
+
+}  // namespace
+
+void protectNumberSignsInNames(QPDF& pdf) { renameNames(pdf, escapedName); }
+
+void restoreNumberSignsInNames(QPDF& pdf) { renameNames(pdf, unescapedName); }
 
 std::filesystem::path prepareOutputPath(const std::string& path) {
     namespace fs = std::filesystem;
@@ -101,18 +119,27 @@ std::filesystem::path prepareOutputPath(const std::string& path) {
     return absolute;
 }
 
-bool saveDocument(QPDF& pdf, const std::filesystem::path& path) {
+bool saveDocument(QPDF& pdf, const std::filesystem::path& path, bool linearise) {
     namespace fs = std::filesystem;
     if (path.empty()) return false;
     fs::path temporary = path;
     temporary += ".vorlan-" + std::to_string(::getpid()) + ".tmp";
+    bool written = false;
     try {
         protectNumberSignsInNames(pdf);
         QPDFWriter writer(pdf, temporary.c_str());
-        writer.setLinearization(true);
+        writer.setLinearization(linearise);
         writer.setDeterministicID(true);
         writer.write();
+        written = true;
     } catch (const std::exception&) {
+    }
+    try {
+        restoreNumberSignsInNames(pdf);
+    } catch (const std::exception&) {
+        written = false;
+    }
+    if (!written) {
         std::error_code ec;
         fs::remove(temporary, ec);
         return false;

@@ -18,14 +18,18 @@ std::filesystem::path prepareOutputPath(const std::string& path);
 
 // Escapes '#' inside every name and dictionary key of the document (as "#23"). qpdf 11.3 writes
 // the '#' of decoded names as it stands, which readers take as the start of an escape, so the
-// names would come back corrupted. Call once, right before saving; the document's names read
-// differently in memory afterwards.
+// names would come back corrupted. restoreNumberSignsInNames takes the escapes back, so that the
+// document reads as before (a name that held "#23" itself keeps it).
 void protectNumberSignsInNames(QPDF& pdf);
+void restoreNumberSignsInNames(QPDF& pdf);
 
-// Full save with linearisation and a deterministic file ID, through a temporary file beside the
-// target that is renamed over it, so the target is either the complete new file or untouched
-// (saving over the open input is therefore safe). Names are protected first. False on any
-// failure. Never throws.
-bool saveDocument(QPDF& pdf, const std::filesystem::path& path);
+// Full save with linearisation (unless told otherwise) and a deterministic file ID, through a
+// temporary file beside the target that is renamed over it, so the target is either the complete
+// new file or untouched (saving over the open input is therefore safe). Names are protected for
+// the write and restored afterwards. False on any failure. Never throws.
+//
+// qpdf works out a document's linearisation once: a document changed after a linearised save
+// must not be saved linearised again (write it without, and linearise a fresh opening of that).
+bool saveDocument(QPDF& pdf, const std::filesystem::path& path, bool linearise = true);
 
 }  // namespace vorlan::pdf

@@ -25,7 +25,7 @@ constexpr int kNotWrapped = -2;
 class LayerConverter {
 public:
     LayerConverter(QPDF& pdf, const std::vector<ConversionEntry>& entries, bool allSeparations)
-        : pdf_(pdf), variants_(pdf), allSeparations_(allSeparations) {
+        : pdf_(pdf), variants_(pdf, compressor_), allSeparations_(allSeparations) {
         for (const ConversionEntry& e : entries) table_.push_back(e.isSeparation ? e.name : std::string());
     }
 
@@ -38,7 +38,7 @@ public:
         if (!content->complete && content->bytes.empty()) return false;  // unreadable: left alone
         ContentEditor editor(*content);
         walk(*content, content->elements, editor);
-        editor.apply(pdf_);
+        editor.apply(pdf_, compressor_);
         hideAnnotations(page);
         return content->complete;
     }
@@ -190,6 +190,7 @@ private:
     }
 
     QPDF& pdf_;
+    StreamCompressor compressor_;
     FormVariants variants_;
     bool allSeparations_;
     std::vector<std::string> table_;

@@ -3,6 +3,9 @@
 #include "pdf/separation_rewrite.h"
 
 #include <qpdf/QPDFObjectHandle.hh>
+#include <qpdf/QPDFPageObjectHelper.hh>
+
+#include <unistd.h>
 
 #include <cstring>
 #include <exception>
@@ -71,25 +74,58 @@ bool hasColorants(const ColourSpaceRef& space) {
     return (space->family == ColourFamily::Indexed || space->family == ColourFamily::Pattern) && hasColorants(space->base);
 }
 
+std::shared_ptr<Content> parseForRewriting(QPDFObjectHandle page, ColourSpaceResolver::SharedCache* cache,
+                                           FormCache* forms) {
+    return parsePageContent(page, cache, StateLeaves::ColourOnly, forms);
+}
+
 class SeparationRewriter {
 public:
-    SeparationRewriter(QPDF& pdf, const std::vector<std::string>& separations, bool keepListed)
-        : pdf_(pdf), listed_(separations.begin(), separations.end()), keep_(keepListed), variants_(pdf) {}
+    // With recordChanges the rewriter keeps its changes to the document aside (see changes()), so
+    // that other rewriters can work on the same document.
+    SeparationRewriter(QPDF& pdf, const std::vector<std::string>& separations, bool keepListed,
+                       bool recordChanges = false)
+        : pdf_(pdf),
+          listed_(separations.begin(), separations.end()),
+          keep_(keepListed),
+          edits_(recordChanges),
+          variants_(pdf, compressor_, &edits_) {}
 
+    // Parses the page of this document and rewrites it.
     bool rewritePage(QPDFObjectHandle page) {
-        std::shared_ptr<Content> content = parsePageContent(page, &cache_, StateLeaves::ColourOnly, &forms_);
-        if (!content->complete && content->bytes.empty()) return false;  // unreadable: left alone
-        ContentEditor editor(*content);
+        std::shared_ptr<Content> content = parseForRewriting(page, &cache_, &forms_);
+        return rewritePage(page, *content);
+    }
+
+    // Rewrites a page from its content as parsed (the parse may be shared with other rewriters:
+    // it is not changed).
+    bool rewritePage(QPDFObjectHandle page, const Content& parsed) {
+        if (!parsed.complete && parsed.bytes.empty()) return false;  // unreadable: left alone
+        Content view;
+        view.owner = page;
+        view.resources = pageResources(page);
+        view.bytes = parsed.bytes;
+        ContentEditor editor(view, &edits_);
         if (keep_) editor.insertText(0, kKnockOutStart);
-        rewrite(*content, content->elements, editor);
-        editor.apply(pdf_);
-        rewriteAnnotations(page, content->resources);
-        return content->complete;
+        rewrite(view, parsed.elements, editor);
+        editor.apply(pdf_, compressor_);
+        rewriteAnnotations(page, view.resources);
+        return parsed.complete;
     }
 
     void finish() { variants_.finish(); }
 
+    DocumentEdits& changes() { return edits_; }
+
 private:
+    static QPDFObjectHandle pageResources(QPDFObjectHandle page) {
+        try {
+            return QPDFPageObjectHelper(page).getAttribute("/Resources", false);
+        } catch (const std::exception&) {
+            return QPDFObjectHandle::newNull();
+        }
+    }
+
     bool affected(const std::string& colorant) const {
         if (colorant == "None") return false;
         const bool listed = listed_.count(colorant) > 0;
@@ -165,7 +201,7 @@ private:
                     rewrite(content, e->children, editor);
                     break;
                 case ElementKind::Form:
-                    rewriteForm(*e, editor);
+                    rewriteForm(*e, content, editor);
                     break;
                 case ElementKind::State:
                     rewriteColourOperator(content, *e, editor);
@@ -223,7 +259,7 @@ private:
         }
         if (!done_.insert(image.getObjGen()).second) return;
         QPDFObjectHandle rep = replacement(e.ownSpace);
-        if (!rep.isNull()) image.getDict().replaceKey("/ColorSpace", rep);
+        if (!rep.isNull()) edits_.setKey(image, "/ColorSpace", rep);
     }
 
     void rewriteInlineImage(Content& content, const ContentElement& e, ContentEditor& editor) {
@@ -257,7 +293,7 @@ private:
                 nothing = true;
                 for (const std::string& c : space->colorants) nothing = nothing && (c == "None" || affected(c));
                 QPDFObjectHandle rep = nothing ? QPDFObjectHandle::newNull() : replacement(space);
-                if (!rep.isNull()) dict.replaceKey("/ColorSpace", rep);
+                if (!rep.isNull()) edits_.setKey(dict, "/ColorSpace", rep);
             } else {
                 nothing = keep_;
             }
@@ -285,7 +321,7 @@ private:
         QPDFObjectHandle pattern = patterns.getKey(name);
         if (pattern.isIndirect()) {
             // A pattern that paints nothing is replaced where it is listed, in every listing.
-            if (emptied_.count(pattern.getObjGen())) patterns.replaceKey(name, emptyPattern());
+            if (emptied_.count(pattern.getObjGen())) edits_.setKey(patterns, name, emptyPattern());
             if (!done_.insert(pattern.getObjGen()).second) return;
         }
         QPDFObjectHandle dict = pattern.isStream() ? pattern.getDict() : pattern;
@@ -296,7 +332,7 @@ private:
         if (type == 2) {
             if (!shadingPaintsNothing(dict.getKey("/Shading"))) return;
             if (pattern.isIndirect()) emptied_.insert(pattern.getObjGen());
-            patterns.replaceKey(name, emptyPattern());
+            edits_.setKey(patterns, name, emptyPattern());
         } else if (type == 1 && paint == 1 && pattern.isStream()) {
             rewriteStreamInPlace(pattern, parentResources, keep_);
         }
@@ -307,10 +343,10 @@ private:
     void rewriteStreamInPlace(QPDFObjectHandle stream, QPDFObjectHandle parentResources, bool knockOutStart) {
         std::shared_ptr<Content> content = parseFormContent(stream, parentResources, GraphicsState::initial(), &cache_, StateLeaves::ColourOnly);
         if (!content->complete && content->bytes.empty()) return;
-        ContentEditor editor(*content);
+        ContentEditor editor(*content, &edits_);
         if (knockOutStart) editor.insertText(0, kKnockOutStart);
         rewrite(*content, content->elements, editor);
-        editor.apply(pdf_);
+        editor.apply(pdf_, compressor_);
     }
 
     // Type 3 glyphs may set their own colours (d0): their procedures are rewritten once per font.
@@ -334,9 +370,11 @@ private:
         }
     }
 
-    void rewriteForm(const ContentElement& e, ContentEditor& parent) {
-        variants_.editUse(e, parent,
-                          [&](Content& content, ContentEditor& editor) { rewrite(content, content.elements, editor); });
+    void rewriteForm(const ContentElement& e, Content& parentView, ContentEditor& parent) {
+        variants_.editUse(e, e.object, parentView.resources, parent,
+                          [&](Content& view, const Content& parsed, ContentEditor& editor) {
+                              rewrite(view, parsed.elements, editor);
+                          });
     }
 
     // Appearance streams are drawn from the initial state, like a form used at the page's start.
@@ -351,12 +389,12 @@ private:
                 QPDFObjectHandle entry = ap.getKey(key);
                 if (entry.isStream()) {
                     QPDFObjectHandle target = rewriteAppearance(entry, pageResources);
-                    if (!target.isSameObjectAs(entry)) ap.replaceKey(key, target);
+                    if (!target.isSameObjectAs(entry)) edits_.setKey(ap, key, target);
                 } else if (entry.isDictionary()) {
                     for (auto& [state, stream] : entry.ditems()) {
                         if (!stream.isStream()) continue;
                         QPDFObjectHandle target = rewriteAppearance(stream, pageResources);
-                        if (!target.isSameObjectAs(stream)) entry.replaceKey(state, target);
+                        if (!target.isSameObjectAs(stream)) edits_.setKey(entry, state, target);
                     }
                 }
             }
@@ -366,7 +404,7 @@ private:
     QPDFObjectHandle rewriteAppearance(QPDFObjectHandle stream, QPDFObjectHandle pageResources) {
         std::shared_ptr<Content> content = parseFormContent(stream, pageResources, GraphicsState::initial(), &cache_, StateLeaves::ColourOnly);
         if (!content->complete && content->bytes.empty()) return stream;
-        ContentEditor editor(*content);
+        ContentEditor editor(*content, &edits_);
         if (keep_) editor.insertText(0, kKnockOutStart);
         rewrite(*content, content->elements, editor);
         std::string bytes = editor.edited() ? editor.result() : content->bytes;
@@ -376,6 +414,8 @@ private:
     QPDF& pdf_;
     std::set<std::string> listed_;
     bool keep_;
+    DocumentEdits edits_;
+    StreamCompressor compressor_;
     FormVariants variants_;
     ColourSpaceResolver::SharedCache cache_;
     FormCache forms_;                                   // parsed forms, shared between uses
@@ -422,10 +462,71 @@ int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* o
 
 std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* input,
                                            const std::vector<SeparationVariant>& variants) {
-    std::vector<int> results;
-    results.reserve(variants.size());
-    for (const SeparationVariant& variant : variants)
-        results.push_back(rewriteSeparations(fs, input, variant.output.c_str(), variant.separations, variant.keepListed));
+    if (fs) ensurePdfLibraryStarted(fs);
+    std::vector<int> results(variants.size(), 1);
+    if (!input || !*input) return results;
+    std::unique_ptr<QPDF> pdf = openDocument(input, false);
+    if (!pdf) return results;
+    // Every page is read and parsed once; each variant's rewriter records its changes, which are
+    // made for its save alone and taken back afterwards.
+    struct Target {
+        size_t index;
+        std::filesystem::path path;
+        std::unique_ptr<SeparationRewriter> rewriter;
+        bool ok = true;
+    };
+    std::vector<Target> targets;
+    for (size_t i = 0; i < variants.size(); ++i) {
+        std::filesystem::path path = prepareOutputPath(variants[i].output);
+        if (path.empty()) continue;
+        targets.push_back({i, std::move(path),
+                           std::make_unique<SeparationRewriter>(*pdf, variants[i].separations,
+                                                                variants[i].keepListed, true)});
+    }
+    {
+        ColourSpaceResolver::SharedCache cache;
+        FormCache forms;
+        for (QPDFObjectHandle page : documentPages(*pdf)) {
+            std::shared_ptr<Content> parsed;
+            try {
+                parsed = parseForRewriting(page, &cache, &forms);
+            } catch (const std::exception&) {
+            }
+            for (Target& t : targets) {
+                try {
+                    if (!parsed || !t.rewriter->rewritePage(page, *parsed)) t.ok = false;
+                } catch (const std::exception&) {
+                    t.ok = false;
+                }
+            }
+        }
+    }
+    for (Target& t : targets) {
+        DocumentEdits& changes = t.rewriter->changes();
+        try {
+            t.rewriter->finish();
+            if (t.ok) {
+                // The shared document is written as it is (qpdf cannot linearise one document
+                // twice) and that file, opened afresh, is saved linearised.
+                std::filesystem::path plain = t.path;
+                plain += ".vorlan-plain-" + std::to_string(::getpid()) + ".tmp";
+                changes.apply();
+                const bool written = saveDocument(*pdf, plain, false);
+                changes.undo();
+                std::unique_ptr<QPDF> copy = written ? openDocument(plain.c_str(), false) : nullptr;
+                if (copy && saveDocument(*copy, t.path)) results[t.index] = 0;
+                copy.reset();
+                std::error_code ec;
+                std::filesystem::remove(plain, ec);
+            }
+        } catch (const std::exception&) {
+            // A variant whose changes could not be made or taken back leaves the document in an
+            // unknown state: the variants after it are not written.
+            results[t.index] = 1;
+            break;
+        }
+        t.rewriter.reset();
+    }
     return results;
 }
 

@@ -2,42 +2,54 @@
 
 #include <zlib.h>
 
-#include <stdexcept>
+#include <climits>
 
 namespace vorlan::pdf {
-namespace {
 
-// Flate data of `bytes` at the fastest level; empty when zlib fails.
-std::string deflateFast(const std::string& bytes) {
+struct StreamCompressor::State {
     z_stream z{};
-    if (deflateInit2(&z, Z_BEST_SPEED, Z_DEFLATED, 15, 8, Z_DEFAULT_STRATEGY) != Z_OK) return {};
-    std::string out(deflateBound(&z, static_cast<uLong>(bytes.size())), '\0');
+    bool ready = false;
+};
+
+StreamCompressor::StreamCompressor() : state_(std::make_unique<State>()) {
+    state_->ready = deflateInit2(&state_->z, Z_BEST_SPEED, Z_DEFLATED, 15, 8, Z_DEFAULT_STRATEGY) == Z_OK;
+}
+
+StreamCompressor::~StreamCompressor() {
+    if (state_->ready) deflateEnd(&state_->z);
+}
+
+bool StreamCompressor::deflate(const std::string& bytes, std::string& packed) {
+    z_stream& z = state_->z;
+    if (!state_->ready || bytes.size() > UINT_MAX / 2 || deflateReset(&z) != Z_OK) return false;
+    packed.resize(deflateBound(&z, static_cast<uLong>(bytes.size())));
     z.next_in = reinterpret_cast<Bytef*>(const_cast<char*>(bytes.data()));
     z.avail_in = static_cast<uInt>(bytes.size());
-    z.next_out = reinterpret_cast<Bytef*>(out.data());
-    z.avail_out = static_cast<uInt>(out.size());
-    const int status = deflate(&z, Z_FINISH);
-    const size_t written = out.size() - z.avail_out;
-    deflateEnd(&z);
-    if (status != Z_STREAM_END) return {};
-    out.resize(written);
-    return out;
+    z.next_out = reinterpret_cast<Bytef*>(packed.data());
+    z.avail_out = static_cast<uInt>(packed.size());
+    if (::deflate(&z, Z_FINISH) != Z_STREAM_END) return false;
+    packed.resize(packed.size() - z.avail_out);
+    return packed.size() < bytes.size();
 }
 
-}  // namespace
-
-void setCompressedStreamData(QPDFObjectHandle stream, const std::string& bytes) {
-    std::string packed = bytes.size() < UINT32_MAX / 2 ? deflateFast(bytes) : std::string();
-    if (packed.empty() || packed.size() >= bytes.size()) {
-        stream.replaceStreamData(bytes, QPDFObjectHandle::newNull(), QPDFObjectHandle::newNull());
-        return;
+StreamData StreamCompressor::pack(const std::string& bytes) {
+    StreamData data;
+    if (deflate(bytes, data.bytes)) {
+        data.filter = QPDFObjectHandle::newName("/FlateDecode");
+    } else {
+        data.bytes = bytes;
     }
-    stream.replaceStreamData(packed, QPDFObjectHandle::newName("/FlateDecode"), QPDFObjectHandle::newNull());
+    return data;
 }
 
-QPDFObjectHandle newCompressedStream(QPDF& pdf, const std::string& bytes) {
+void StreamCompressor::setData(QPDFObjectHandle stream, const std::string& bytes) {
+    StreamData data = pack(bytes);
+    stream.replaceStreamData(data.bytes, data.filter, QPDFObjectHandle::newNull());
+}
+
+QPDFObjectHandle StreamCompressor::newStream(QPDF& pdf, const std::string& bytes) {
     QPDFObjectHandle stream = QPDFObjectHandle::newStream(&pdf);
-    setCompressedStreamData(stream, bytes);
+    setData(stream, bytes);
     return stream;
 }
 

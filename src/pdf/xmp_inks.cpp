@@ -163,17 +163,20 @@ bool readXMPInks(const char* packet, std::vector<XMPInk>& inks) {
     return reader.walked;
 }
 
-void collectEskoTechnicalInks(const char* pdfPath, std::vector<std::string>& technicalInks,
-                              std::vector<std::string>& dieInks) {
-    vorlan::pdf::PdfSession session;
-    std::unique_ptr<QPDF> pdf = vorlan::pdf::openDocument(pdfPath, false);
-    if (!pdf) return;
-    std::string xmp = vorlan::pdf::documentXmp(*pdf);
-    if (xmp.empty()) return;
+void vorlan::pdf::documentEskoInks(QPDF& pdf, std::vector<std::string>& technicalInks,
+                                   std::vector<std::string>& dieInks) {
+    std::string xmp = documentXmp(pdf);
     std::vector<XMPInk> inks;
-    if (!readXMPInks(xmp.c_str(), inks)) return;
+    if (xmp.empty() || !readXMPInks(xmp.c_str(), inks)) return;
     for (const XMPInk& ink : inks) {
         if (isTechnicalVersionInk(ink)) technicalInks.push_back(ink.name);
         if (isDieInk(ink)) dieInks.push_back(ink.name);
     }
+}
+
+void collectEskoTechnicalInks(const char* pdfPath, std::vector<std::string>& technicalInks,
+                              std::vector<std::string>& dieInks) {
+    vorlan::pdf::PdfSession session;
+    std::unique_ptr<QPDF> pdf = vorlan::pdf::openDocument(pdfPath, false);
+    if (pdf) vorlan::pdf::documentEskoInks(*pdf, technicalInks, dieInks);
 }

@@ -4,6 +4,8 @@
 #include <string>
 #include <vector>
 
+class QPDF;
+
 struct XMPInk {
     std::string name;   // egInk:name, as written (UTF-8)
     int type = 3;       // egInk:type: process 0, pantone 1, designer 2, anything else 3
@@ -24,3 +26,8 @@ inline bool isDieInk(const XMPInk& ink) { return ink.attribute == 3; }
 // A file that cannot be opened, or has no such list, appends nothing.
 void collectEskoTechnicalInks(const char* pdfPath, std::vector<std::string>& technicalInks,
                               std::vector<std::string>& dieInks);
+
+namespace vorlan::pdf {
+// The same for an open document.
+void documentEskoInks(QPDF& pdf, std::vector<std::string>& technicalInks, std::vector<std::string>& dieInks);
+}  // namespace vorlan::pdf

@@ -5,35 +5,40 @@
 #include <string>
 #include <vector>
 
-#include "pdf/description_writer.h"
-#include "pdf/die_library.h"
 #include "pdf/pdf_document.h"
 #include "pdf/page_geometry.h"
 #include "pdf/pdf_session.h"
 #include "pdf/xmp_inks.h"
+#include "versions/description_writer.h"
+#include "versions/die_library.h"
 
 namespace {
 
 constexpr int kEskoResult = 1;
 constexpr int kDieLibraryResult = 2;
 
+// The description for a single PDF: its inks are layers of PDF 0, and every page has one
+// content object (index 0) that switches `off` off.
+InkDescription singlePdfDescription(const char* versionName, const std::vector<std::string>& layerInks,
+                                    const std::vector<std::string>& off, size_t pageCount) {
+    InkDescription d;
+    d.versionName = versionName;
+    for (const std::string& ink : layerInks) d.layers.push_back({0, ink});
+    d.surfaces.assign(pageCount, {InkDescription::ContentObject{0, &off}});
+    return d;
+}
+
 void scanEsko(const char* pdfPath, const char* outputPath) {
     std::unique_ptr<QPDF> pdf = vorlan::pdf::openDocument(pdfPath, false);
     if (!pdf) return;
-    std::string xmp = vorlan::pdf::documentXmp(*pdf);
-    std::vector<XMPInk> inks;
-    if (xmp.empty() || !readXMPInks(xmp.c_str(), inks)) return;
-    ScanDescription d;
-    d.versionName = "EskoTechnicalVersion";
-    for (const XMPInk& ink : inks) {
-        if (isTechnicalVersionInk(ink)) d.layerInks.push_back(ink.name);
-        if (isDieInk(ink)) d.dieInks.push_back(ink.name);
-    }
-    if (d.layerInks.empty()) return;
-    d.offInks = d.layerInks;
-    d.pageCount = static_cast<int>(vorlan::pdf::documentPages(*pdf).size());
-    d.writeDieCut = !d.dieInks.empty();
-    writeScanDescription(outputPath, d);
+    std::vector<std::string> technical, die;
+    vorlan::pdf::documentEskoInks(*pdf, technical, die);
+    if (technical.empty()) return;
+    InkDescription d = singlePdfDescription("EskoTechnicalVersion", technical, technical,
+                                            vorlan::pdf::documentPages(*pdf).size());
+    d.writeDieCut = !die.empty();
+    d.dieInks = std::move(die);
+    writeInkDescription(outputPath, d);
 }
 
 void scanDieLibrary(const char* pdfPath, const char* outputPath) {
@@ -42,17 +47,14 @@ void scanDieLibrary(const char* pdfPath, const char* outputPath) {
     std::vector<std::string> pageInks;
     vorlan::pdf::documentPageInks(*pdf, pageInks);
     if (pageInks.empty()) return;
-    std::vector<DieLibraryEntry> library;
-    if (!loadDieLibrary(dieLibraryPath(), library)) return;
-    ScanDescription d;
-    d.versionName = "KAVDieLibrary";
-    for (const std::string& ink : pageInks)
-        if (isDieSeparation(library, ink)) d.dieInks.push_back(ink);
-    if (d.dieInks.empty()) return;
-    d.layerInks = d.offInks = d.dieInks;
-    d.pageCount = static_cast<int>(vorlan::pdf::documentPages(*pdf).size());
+    DieLibrary library;
+    if (!loadDieLibrary(library, dieLibraryPath())) return;
+    std::vector<std::string> die = dieSeparations(library, pageInks);
+    if (die.empty()) return;
+    InkDescription d = singlePdfDescription("KAVDieLibrary", die, die, vorlan::pdf::documentPages(*pdf).size());
     d.writeDieCut = true;
-    writeScanDescription(outputPath, d);
+    d.dieInks = die;
+    writeInkDescription(outputPath, d);
 }
 
 }  // namespace

@@ -29,19 +29,13 @@ std::string runPartitions(const std::string& pdf, int pages, bool perPage) {
     return x.str();
 }
 
-struct Host {
-    fs::path folder;
-    int counter = 0;
-};
+}  // namespace
 
-// The host names each new PDF the library asks for in the job's out folder.
-int newPdfPath(char* buffer, int size, void* userData) {
-    auto* host = static_cast<Host*>(userData);
+int newPdfPath(char* buffer, int size, void* hostFolder) {
+    auto* host = static_cast<HostFolder*>(hostFolder);
     std::snprintf(buffer, static_cast<size_t>(size), "%s/out-%d.pdf", host->folder.c_str(), host->counter++);
     return 0;
 }
-
-}  // namespace
 
 std::string ticketXml(const TicketSpec& shape) {
     const int surfacesPerSheet = shape.twoSided ? 2 : 1;
@@ -150,12 +144,13 @@ Job writeBarePdfJob(const fs::path& root, const std::string& description) {
     return job;
 }
 
-int consume(const Job& job, const char* pageRange) {
+int consume(const Job& job, const char* pageRange, bool alwaysNameDescription) {
     std::string output = job.output.string();
     std::string description = job.description.string();
-    Host host{job.root / "out"};
+    HostFolder host{job.root / "out"};
     fs::create_directories(host.folder);
-    return vorlan_consume_job(job.dataFile.c_str(), fs::exists(job.description) ? description.c_str() : nullptr,
+    const bool named = alwaysNameDescription || fs::exists(job.description);
+    return vorlan_consume_job(job.dataFile.c_str(), named ? description.c_str() : nullptr,
                               output.data(), job.root.c_str(), pageRange, nullptr, newPdfPath, &host);
 }
 

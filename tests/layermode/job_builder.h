@@ -71,8 +71,17 @@ Job writeTicketJob(const std::filesystem::path& root, const TicketSpec& shape, c
 // A bare-PDF job: X/job1.pdf is the data file.
 Job writeBarePdfJob(const std::filesystem::path& root, const std::string& description);
 
+// The host's FilePathCallback: names each new PDF <folder>/out-<n>.pdf, n counting from 0.
+struct HostFolder {
+    std::filesystem::path folder;
+    int counter = 0;
+};
+int newPdfPath(char* buffer, int size, void* hostFolder);
+
 // Runs the job through vorlan_consume_job; the host's FilePathCallback names files in X/out.
-int consume(const Job& job, const char* pageRange = "All");
+// The description path is passed only when the file exists, unless alwaysNameDescription is set
+// (the job number then comes from its name: job 1).
+int consume(const Job& job, const char* pageRange = "All", bool alwaysNameDescription = false);
 
 // Sets a job attribute of job number 1 in the job store named by VORLAN_JOB_STORE.
 void setJobAttribute(const char* name, const char* value);

@@ -107,7 +107,8 @@ TEST(ContentEdit, RemovedElementsKeepTheirStateEffects) {
     ContentEditor editor(*content);
     editor.remove(content->elements[0]);              // the Gold group
     editor.remove(content->elements[4].children[4]);  // the text run
-    editor.apply(*pdf);
+    StreamCompressor compressor;
+    editor.apply(*pdf, compressor);
     QPDFWriter writer(*pdf, out.c_str());
     writer.write();
     EXPECT_EQ(vorlan::test::runCommand("qpdf --check '" + out + "' >/dev/null 2>&1"), 0);

@@ -1,4 +1,4 @@
-// The Esko XMP ink list, the die library and the two descriptions the scan writes.
+// The Esko XMP ink list and the two descriptions the scan writes.
 #include <gtest/gtest.h>
 
 #include <expat.h>
@@ -6,14 +6,13 @@
 #include <cstdlib>
 #include <tuple>
 
-#include "pdf/description_writer.h"
-#include "pdf/die_library.h"
 #include "pdf/pdf_session.h"
 #include "pdf/xmp_inks.h"
 #include "pdf/xmp_scan.h"
 #include "test_pdf.h"
 #include "test_support.h"
 
+using vorlan::test::DieLibraryHome;
 using vorlan::test::TempDir;
 using vorlan::test::TestInk;
 using vorlan::test::TestPdf;
@@ -60,19 +59,6 @@ std::vector<std::string> attributeValues(const std::string& xml, const std::stri
     EXPECT_TRUE(ok) << "not well-formed:\n" << xml;
     return state.values;
 }
-
-// Points VORLAN_HOME at a fresh folder holding `library` as the die library, for one scope.
-class DieLibraryHome {
-public:
-    explicit DieLibraryHome(const std::string& library) {
-        vorlan::test::writeFile(home_ / "DieLib" / "AutoDieLib.xml", library);
-        setenv("VORLAN_HOME", home_.path().c_str(), 1);
-    }
-    ~DieLibraryHome() { unsetenv("VORLAN_HOME"); }
-
-private:
-    TempDir home_;
-};
 
 const char* kLibrary =
     "<?xml version=\"1.0\"?>\n<AutoDieLibrary><Layers><Layer Name=\"LayerDie\"/></Layers>"
@@ -133,36 +119,6 @@ TEST(XmpInks, CollectsTechnicalAndDieInksFromTheFile) {
     EXPECT_FALSE(pdfLibraryRunning());
     collectEskoTechnicalInks((dir / "missing.pdf").c_str(), technical, die);
     EXPECT_EQ(technical.size(), 2u);
-}
-
-TEST(ScanDescriptionText, ExactLinesAndEscapedNames) {
-    ScanDescription d;
-    d.layerInks = {"Pantone \"Gold\" & <1>", "V"};
-    d.offInks = d.layerInks;
-    d.versionName = "EskoTechnicalVersion";
-    d.pageCount = 1;
-    d.writeDieCut = true;
-    d.dieInks = {"Die"};
-    const std::string text = formatScanDescription(d);
-    EXPECT_EQ(text,
-              "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\" ?>\r\n"
-              "<OptionalContentGroupData>\r\n"
-              "<OptionalLayer pdfIndex=\"0\" OCGName=\"Pantone &quot;Gold&quot; &amp; &lt;1&gt;\" displayName=\"Pantone &quot;Gold&quot; &amp; &lt;1&gt;\" isSep=\"true\"/>\r\n"
-              "<OptionalLayer pdfIndex=\"0\" OCGName=\"V\" displayName=\"V\" isSep=\"true\"/>\r\n"
-              "<Versions>\r\n"
-              "<Version enable=\"true\" name=\"EskoTechnicalVersion\">\r\n"
-              "<Surface index=\" 0 \">\r\n"
-              "<ContentObject index=\"0\" SepNameOff=\"Pantone &quot;Gold&quot; &amp; &lt;1&gt;,V\"/>\r\n"
-              "</Surface>\r\n"
-              "</Version>\r\n"
-              "</Versions>\r\n"
-              "<DieCut enable=\"true\" name=\"AutoDie\">\r\n"
-              "<Surface index=\"0\" dieSepInternalNames=\"Die\"/>\r\n"
-              "</DieCut>\r\n"
-              "</OptionalContentGroupData>\r\n");
-    // A conforming parser reads the names back unchanged.
-    EXPECT_EQ(attributeValues(text, "OptionalLayer", "OCGName"), (std::vector<std::string>{"Pantone \"Gold\" & <1>", "V"}));
-    EXPECT_EQ(escapeXmlAttribute("a\tb\nc"), "a&#9;b&#10;c");
 }
 
 TEST(XmpScan, EskoModeWritesTechnicalVersionAndDieCut) {
@@ -235,17 +191,4 @@ TEST(XmpScan, DieLibraryModeWithoutUsableLibrary) {
         EXPECT_EQ(scanPdfInksToDescription(pdf.c_str(), out.data(), true), 2);
         EXPECT_FALSE(std::filesystem::exists(out));
     }
-}
-
-TEST(DieLibrary, EntriesAndFlags) {
-    std::vector<DieLibraryEntry> entries;
-    ASSERT_TRUE(parseDieLibrary(kLibrary, entries));
-    ASSERT_EQ(entries.size(), 3u);
-    EXPECT_EQ(entries[0].kind, 0);
-    EXPECT_TRUE(entries[1].locked);
-    EXPECT_TRUE(entries[1].printable);
-    EXPECT_FALSE(entries[2].printable);
-    EXPECT_TRUE(isDieSeparation(entries, "Die"));
-    EXPECT_FALSE(isDieSeparation(entries, "die"));
-    EXPECT_FALSE(isDieSeparation(entries, "LayerDie"));
 }

@@ -41,6 +41,13 @@ TempDir::~TempDir() {
     fs::remove_all(path_, ec);
 }
 
+DieLibraryHome::DieLibraryHome(const std::string& library) {
+    writeFile(home_ / "DieLib" / "AutoDieLib.xml", library);
+    setenv("VORLAN_HOME", home_.path().c_str(), 1);
+}
+
+DieLibraryHome::~DieLibraryHome() { unsetenv("VORLAN_HOME"); }
+
 void writeFile(const fs::path& file, const std::string& bytes) {
     if (file.has_parent_path()) fs::create_directories(file.parent_path());
     std::ofstream out(file, std::ios::binary | std::ios::trunc);
@@ -64,6 +71,21 @@ int runCommand(const std::string& command, std::string* output) {
     int status = ::pclose(pipe);
     if (output) *output = text;
     return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+}
+
+std::vector<std::string> filesFailingJdfSchema(const std::vector<fs::path>& files, std::string* report) {
+    const fs::path xsd = corpusDir() / "jdf-schema" / "xmllint-patched" / "JDF_1.8" / "JDF.xsd";
+    EXPECT_TRUE(fs::exists(xsd)) << xsd;
+    EXPECT_TRUE(haveProgram("xmllint")) << "xmllint (libxml2-utils) is needed to check the schema";
+    std::string command = "xmllint --noout --schema '" + xsd.string() + "'";
+    for (const fs::path& f : files) command += " '" + f.string() + "'";
+    std::string output;
+    runCommand(command + " 2>&1", &output);
+    std::vector<std::string> failing;
+    for (const fs::path& f : files)
+        if (output.find(f.string() + " validates") == std::string::npos) failing.push_back(f.string());
+    if (report) *report = output;
+    return failing;
 }
 
 bool haveProgram(const std::string& name) {

@@ -26,6 +26,17 @@ private:
     std::filesystem::path path_;
 };
 
+// Points VORLAN_HOME at a fresh folder holding `library` as the die library
+// (DieLib/AutoDieLib.xml), for the object's lifetime.
+class DieLibraryHome {
+public:
+    explicit DieLibraryHome(const std::string& library);
+    ~DieLibraryHome();
+
+private:
+    TempDir home_;
+};
+
 // Writes bytes to a file, creating parent folders.
 void writeFile(const std::filesystem::path& file, const std::string& bytes);
 // Reads a whole file; empty when it cannot be read.
@@ -34,6 +45,11 @@ std::string readFile(const std::filesystem::path& file);
 int runCommand(const std::string& command, std::string* output = nullptr);
 // True when a program is on PATH.
 bool haveProgram(const std::string& name);
+// Validates JDF files against the JDF 1.8 schema in one xmllint call. Returns the names of the
+// files that do not validate (empty when all do); *report receives xmllint's messages when given.
+// Fails the calling test when the corpus schema or xmllint is missing.
+std::vector<std::string> filesFailingJdfSchema(const std::vector<std::filesystem::path>& files,
+                                               std::string* report = nullptr);
 // A minimal valid one-page PDF (optionally with a content stream) as bytes.
 std::string minimalPdf(const std::string& content = "0 0 m 10 10 l S");
 // A PDF of the given object bodies, numbered from 1 (object 1 is the catalog), with a

@@ -4,6 +4,7 @@
 #include <cstdio>
 
 #include "entry/result_codes.h"
+#include "platform/os/text.h"
 
 namespace vorlan::cli {
 
@@ -49,6 +50,45 @@ std::string jsonString(const std::string& text) {
         }
     }
     return out + "\"";
+}
+
+void Report::end() {
+    bool wasArray = stack_.back().array;
+    stack_.pop_back();
+    if (json_) std::printf("\n%s%c", indent().c_str(), wasArray ? ']' : '}');
+    if (stack_.empty() && json_) std::printf("\n");
+}
+
+void Report::field(const std::string& key, const wchar_t* text) { field(key, vorlan::os::toUtf8(text)); }
+
+void Report::field(const std::string& key, double value) {
+    char text[64];
+    std::snprintf(text, sizeof text, "%g", value);
+    emit(key, text);
+}
+
+void Report::separator() {
+    if (stack_.empty()) return;
+    if (json_) std::printf("%s\n", stack_.back().first ? "" : ",");
+    stack_.back().first = false;
+}
+
+void Report::open(const std::string& key, char bracket) {
+    separator();
+    if (json_) {
+        std::printf("%s", indent().c_str());
+        if (!key.empty() && !stack_.empty() && !stack_.back().array) std::printf("%s: ", jsonString(key).c_str());
+        std::printf("%c", bracket);
+    } else if (!key.empty()) {
+        std::printf("%s%s:\n", indent().c_str(), key.c_str());
+    }
+    stack_.push_back({bracket == '[', true});
+}
+
+void Report::emit(const std::string& key, const std::string& value) {
+    separator();
+    if (json_) std::printf("%s%s: %s", indent().c_str(), jsonString(key).c_str(), value.c_str());
+    else std::printf("%s%s: %s\n", indent().c_str(), key.c_str(), value.c_str());
 }
 
 int reportResult(int code, bool json) {

@@ -19,4 +19,32 @@ int reportResult(int code, bool json);
 // Escapes text for a JSON string literal.
 std::string jsonString(const std::string& text);
 
+// Writes nested lists and records to standard output, either as indented text or as JSON.
+class Report {
+public:
+    explicit Report(bool json) : json_(json) {}
+
+    void beginObject(const std::string& key = "") { open(key, '{'); }
+    void beginArray(const std::string& key) { open(key, '['); }
+    void end();
+    void field(const std::string& key, const std::string& text) { emit(key, json_ ? jsonString(text) : text); }
+    void field(const std::string& key, const wchar_t* text);
+    void field(const std::string& key, long long value) { emit(key, std::to_string(value)); }
+    void field(const std::string& key, double value);
+    void flag(const std::string& key, bool value) { emit(key, value ? "true" : "false"); }
+
+private:
+    struct Level {
+        bool array;
+        bool first;
+    };
+    std::string indent() const { return std::string(stack_.size() * 2, ' '); }
+    void separator();
+    void open(const std::string& key, char bracket);
+    void emit(const std::string& key, const std::string& value);
+
+    bool json_;
+    std::vector<Level> stack_;
+};
+
 }  // namespace vorlan::cli

@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "autoimpose/auto_imposition.h"
 #include "commands.h"
 #include "vorlan/vorlan.h"
 
@@ -21,15 +22,52 @@ int runValid(Args args) {
     return valid ? 0 : 1;
 }
 
+namespace {
+
+void reportChanges(Report& r, const autoimpose::ImpositionChanges& c) {
+    r.beginObject("changes");
+    r.flag("renderingParamsAdded", c.renderingParamsAdded);
+    r.flag("deliveryOptions", c.deliveryOptions);
+    r.field("markPages", static_cast<long long>(c.markPages));
+    r.field("labelPages", static_cast<long long>(c.labelPages));
+    r.flag("marksRunList", c.marksRunList);
+    r.field("documentRuns", static_cast<long long>(c.documentRuns));
+    r.field("markObjects", static_cast<long long>(c.markObjects));
+    r.field("labelObjects", static_cast<long long>(c.labelObjects));
+    r.field("renumberedObjects", static_cast<long long>(c.renumberedObjects));
+    r.field("sidesSet", static_cast<long long>(c.sidesSet));
+    r.field("trimSizes", static_cast<long long>(c.trimSizes));
+    r.field("fitPolicies", static_cast<long long>(c.fitPolicies));
+    r.field("stacks", static_cast<long long>(c.stacks));
+    r.field("stackedObjects", static_cast<long long>(c.stackedObjects));
+    r.field("sheetRangeParts", static_cast<long long>(c.sheetRangeParts));
+    r.end();
+}
+
+}  // namespace
+
 int runAutoimpose(Args args) {
     bool json = takeFlag(args, "--json");
     if (wantsHelp(args) || args.size() != 2) {
         std::fputs("usage: vorlan autoimpose [--json] SETTINGS_XML TICKET_JDF\n\n"
-                   "Rewrites TICKET_JDF in place into an imposed layout from the auto-impose settings.\n",
+                   "Rewrites TICKET_JDF in place into an imposed layout from the auto-impose settings and\n"
+                   "prints what changed. On failure the ticket is left as it was. Exit status: the result\n"
+                   "code (0 rewritten, 1 failed).\n",
                    wantsHelp(args) ? stdout : stderr);
         return wantsHelp(args) ? 0 : 2;
     }
-    return reportResult(vorlan_autoimp(args[0].c_str(), args[1].c_str(), nullptr, nullptr), json);
+    autoimpose::AutoImpositionSettings settings;
+    settings.settingsPath = args[0];
+    settings.jdfPath = args[1];
+    autoimpose::ImpositionChanges changes;
+    const bool rewritten = autoimpose::imposeTicket(settings, &changes);
+    Report r(json);
+    r.beginObject();
+    r.field("ticket", args[1]);
+    r.flag("rewritten", rewritten);
+    if (rewritten) reportChanges(r, changes);
+    r.end();
+    return reportResult(rewritten ? LD_OK : LD_FAILED, json);
 }
 
 int runScanXmp(Args args) {

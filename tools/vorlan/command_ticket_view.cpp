@@ -11,61 +11,6 @@
 namespace vorlan::cli {
 namespace {
 
-// Writes nested lists and records either as indented text or as JSON.
-class Report {
-public:
-    explicit Report(bool json) : json_(json) {}
-
-    void beginObject(const std::string& key = "") { open(key, '{'); }
-    void beginArray(const std::string& key) { open(key, '['); }
-    void end() {
-        bool wasArray = stack_.back().array;
-        stack_.pop_back();
-        if (json_) std::printf("\n%s%c", indent().c_str(), wasArray ? ']' : '}');
-        if (stack_.empty() && json_) std::printf("\n");
-    }
-    void field(const std::string& key, const std::string& text) { emit(key, json_ ? jsonString(text) : text); }
-    void field(const std::string& key, const wchar_t* text) { field(key, vorlan::os::toUtf8(text)); }
-    void field(const std::string& key, long long value) { emit(key, std::to_string(value)); }
-    void field(const std::string& key, double value) {
-        char text[64];
-        std::snprintf(text, sizeof text, "%g", value);
-        emit(key, text);
-    }
-    void flag(const std::string& key, bool value) { emit(key, value ? "true" : "false"); }
-
-private:
-    struct Level {
-        bool array;
-        bool first;
-    };
-    std::string indent() const { return std::string(stack_.size() * 2, ' '); }
-    void separator() {
-        if (stack_.empty()) return;
-        if (json_) std::printf("%s\n", stack_.back().first ? "" : ",");
-        stack_.back().first = false;
-    }
-    void open(const std::string& key, char bracket) {
-        separator();
-        if (json_) {
-            std::printf("%s", indent().c_str());
-            if (!key.empty() && !stack_.empty() && !stack_.back().array) std::printf("%s: ", jsonString(key).c_str());
-            std::printf("%c", bracket);
-        } else if (!key.empty()) {
-            std::printf("%s%s:\n", indent().c_str(), key.c_str());
-        }
-        stack_.push_back({bracket == '[', true});
-    }
-    void emit(const std::string& key, const std::string& value) {
-        separator();
-        if (json_) std::printf("%s%s: %s", indent().c_str(), jsonString(key).c_str(), value.c_str());
-        else std::printf("%s%s: %s\n", indent().c_str(), key.c_str(), value.c_str());
-    }
-
-    bool json_;
-    std::vector<Level> stack_;
-};
-
 void reportPdfs(Report& r, const std::string& key, const std::vector<LD_PDF*>& pdfs) {
     r.beginArray(key);
     for (const LD_PDF* pdf : pdfs) {

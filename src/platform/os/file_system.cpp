@@ -4,6 +4,7 @@
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <utility>
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -69,6 +70,20 @@ bool writeFileAtomically(const fs::path& path, const std::string& bytes) {
     if (ok) ok = ::rename(pattern.c_str(), path.c_str()) == 0;
     if (!ok) ::unlink(pattern.c_str());
     return ok;
+}
+
+TemporaryFile::TemporaryFile(const fs::path& folder, const std::string& prefix) {
+    std::string pattern = (folder / (prefix + "XXXXXX")).string();
+    int fd = ::mkstemp(pattern.data());
+    if (fd < 0) return;
+    ::close(fd);
+    path_ = std::move(pattern);
+}
+
+void TemporaryFile::remove() {
+    if (path_.empty()) return;
+    ::unlink(path_.c_str());
+    path_.clear();
 }
 
 }  // namespace vorlan::os

@@ -37,4 +37,21 @@ bool copyFile(const std::filesystem::path& from, const std::filesystem::path& to
 // over the target. False (and the target untouched) on failure.
 bool writeFileAtomically(const std::filesystem::path& path, const std::string& bytes);
 
+// A new empty file with a name no other file has (prefix followed by six random characters) in
+// a folder, removed when the object dies. path() is empty when the file could not be created.
+class TemporaryFile {
+public:
+    TemporaryFile(const std::filesystem::path& folder, const std::string& prefix);
+    ~TemporaryFile() { remove(); }
+    TemporaryFile(const TemporaryFile&) = delete;
+    TemporaryFile& operator=(const TemporaryFile&) = delete;
+
+    const std::string& path() const { return path_; }
+    // Removes the file now (also when something else replaced it meanwhile); path() becomes empty.
+    void remove();
+
+private:
+    std::string path_;
+};
+
 }  // namespace vorlan::os

@@ -1,6 +1,9 @@
 #include "platform/os/text.h"
 
+#include <cctype>
 #include <cerrno>
+#include <charconv>
+#include <cmath>
 #include <climits>
 #include <clocale>
 #include <cstdlib>
@@ -116,20 +119,56 @@ std::wstring fromUtf8(const std::string& bytes) {
     return out;
 }
 
-int wtoi(const wchar_t* text) {
+namespace {
+
+bool isBlank(wchar_t c) { return std::iswspace(static_cast<wint_t>(c)) != 0; }
+bool isBlank(char c) { return std::isspace(static_cast<unsigned char>(c)) != 0; }
+
+// Reads leading white space, an optional sign and decimal digits, saturating at the int limits.
+// *found tells whether any digit was read.
+template <typename Char>
+int leadingInteger(const Char* text, bool* found) {
+    *found = false;
     if (!text) return 0;
-    while (std::iswspace(static_cast<wint_t>(*text))) ++text;
+    while (isBlank(*text)) ++text;
     bool negative = false;
-    if (*text == L'+' || *text == L'-') negative = (*text++ == L'-');
+    if (*text == '+' || *text == '-') negative = (*text++ == '-');
     long long value = 0;
-    while (*text >= L'0' && *text <= L'9') {
-        if (value <= static_cast<long long>(INT_MAX) + 1) value = value * 10 + (*text - L'0');
+    while (*text >= '0' && *text <= '9') {
+        if (value <= static_cast<long long>(INT_MAX) + 1) value = value * 10 + (*text - '0');
         ++text;
+        *found = true;
     }
     if (negative) value = -value;
     if (value > INT_MAX) return INT_MAX;
     if (value < INT_MIN) return INT_MIN;
     return static_cast<int>(value);
+}
+
+}  // namespace
+
+int wtoi(const wchar_t* text) {
+    bool found = false;
+    return leadingInteger(text, &found);
+}
+
+bool readLeadingInteger(const char* text, int32_t& value) {
+    bool found = false;
+    int read = leadingInteger(text, &found);
+    if (found) value = read;
+    return found;
+}
+
+bool readDecimal(const char* text, double& value) {
+    if (!text) return false;
+    while (isBlank(*text)) ++text;
+    if (*text == '+' && text[1] != '-') ++text;  // from_chars takes no plus sign
+    const char* end = text + std::strlen(text);
+    double read = 0;
+    auto [rest, error] = std::from_chars(text, end, read);
+    if (error != std::errc() || rest == text || !std::isfinite(read)) return false;
+    value = read;
+    return true;
 }
 
 bool equalsIgnoreCase(const wchar_t* a, const wchar_t* b) {

@@ -1,6 +1,7 @@
 // Text conversion and number reading shared by every layer (what the Win32 text calls did).
 #pragma once
 
+#include <cstdint>
 #include <cwchar>
 #include <string>
 
@@ -24,6 +25,12 @@ std::wstring fromUtf8(const std::string& bytes);
 // Reads a number like the C runtime's _wtoi: leading white space, optional sign, decimal digits up
 // to the first other character; 0 when there are none. Saturates instead of overflowing.
 int wtoi(const wchar_t* text);
+// Reads a leading integer as _wtoi does (saturating) into value; false, value unchanged, when the
+// text does not start (after white space) with an optionally signed digit.
+bool readLeadingInteger(const char* text, int32_t& value);
+// Reads a leading decimal number ("12.5", "-3e2", "7mm" reads 7) into value, whatever the
+// locale; false, value unchanged, when there is none or it is out of range or not finite.
+bool readDecimal(const char* text, double& value);
 
 // Case-insensitive comparison of wide strings (null equals only null).
 bool equalsIgnoreCase(const wchar_t* a, const wchar_t* b);
