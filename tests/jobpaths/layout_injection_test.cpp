@@ -40,7 +40,6 @@ Job writeJob(const fs::path& root, const std::string& ticket) {
     Job job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo", root / "out.jdf"};
     vorlan::test::writeFile(job.dataFile, "data file of job 1\n");
     vorlan::test::writeFile(job.dataFolder / "ticket.jdf", ticket);
-    vorlan::test::writeFile(job.description, "");  // names the job number; never read for these jobs
     return job;
 }
 
@@ -109,7 +108,7 @@ TEST_F(LayoutInjection, PartsFollowThePageRangeAndTheDieLine) {
         for (auto [file, pages] : {std::pair{"a.pdf", 3}, {"b.pdf", 3}, {"c.pdf", 2}, {"dwc.pdf", 1}, {"die.pdf", 1}, {"cut.pdf", 1}})
             writePdf(job.dataFolder / file, pages);
         setJobAttribute("KVPrintDieLine", c.dieLine ? "True" : "False");
-        ASSERT_EQ(consume(job, c.range), LD_OK);
+        ASSERT_EQ(consume(job, c.range, true), LD_OK);
         outputs.push_back(job.output);
 
         TicketView t(job.output);
@@ -150,7 +149,7 @@ TEST_F(LayoutInjection, FilesAreFoundInTheDataFolderUnlessTheUrlIsAbsolute) {
         Job job = writeJob(tmp / range, ticket);
         fs::create_directories(job.dataFolder / "sub");
         writePdf(job.dataFolder / "sub" / "a.pdf", 2);
-        ASSERT_EQ(consume(job, range), LD_OK);
+        ASSERT_EQ(consume(job, range, true), LD_OK);
         TicketView t(job.output);
         std::vector<std::string> urls;
         for (auto f : t.all("//RunList/RunList/LayoutElement/FileSpec")) urls.push_back(f.node().attribute("URL").value());
@@ -171,9 +170,9 @@ TEST_F(LayoutInjection, FailuresAreReportedAndLeaveNoTicket) {
     Job job = writeJob(tmp.path(), ticketXml(partition(0, "a.pdf", R"(NPage="2")")));
     Job unwritable = job;
     unwritable.output = tmp / "missing-folder" / "out.jdf";
-    EXPECT_EQ(consume(unwritable, "All"), LD_JDF_WRITE_FAILED);
+    EXPECT_EQ(consume(unwritable, "All", true), LD_JDF_WRITE_FAILED);
     EXPECT_FALSE(fs::exists(unwritable.output));
-    EXPECT_EQ(consume(job, "All"), LD_OK);
+    EXPECT_EQ(consume(job, "All", true), LD_OK);
 
     // A ticket that cannot be parsed (again), or none at all, and one claiming more pages than
     // a layout can be given.
@@ -209,7 +208,7 @@ TEST_F(LayoutInjection, CorpusTicketsWithoutLayout) {
             fs::path root = tmp / (name + "-" + (range[0] == 'A' ? "all" : "list"));
             Job job = writeJob(root, "");
             fs::copy_file(entry.path(), job.dataFolder / "ticket.jdf", fs::copy_options::overwrite_existing);
-            int result = consume(job, range);
+            int result = consume(job, range, true);
             if (result == LD_JDF_UNUSABLE) continue;  // the reader refused it
             ASSERT_EQ(result, LD_OK);
             outputs.push_back(job.output);
