@@ -344,8 +344,9 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
                 static_cast<unsigned long long>(initializationTime));
 
     // A layout with surfaces needs content pages to place on them; without any, the job
-    // cannot be versioned and is reported as unusable.
-    if (jobHasTicket && numberOfSurfaces > 0 && m_OrdinalTable.empty()) {
+    // cannot be versioned and is reported as unusable. A ticket that came without a layout is
+    // not versioned: it gets a ticket of its own from its run lists.
+    if (jobHasTicket && t.ticketHasLayout && numberOfSurfaces > 0 && m_OrdinalTable.empty()) {
         lastError = LD_JDF_UNUSABLE;
         return LD_JDF_UNUSABLE;
     }
