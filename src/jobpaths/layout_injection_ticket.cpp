@@ -49,7 +49,8 @@ LDError LayoutInjectionProcessingJdf::writeTicket() {
         if (w.pageRangeMode == 0) {
             for (const Part* p : content_) appendWholeRun(w, runList, next, *p->run, p->url);
         } else {
-            // One part per selected page: that page alone.
+            // One part per selected page, holding that page alone (not its run's whole page list,
+            // which would print every page of the run once per selected page).
             for (size_t i = 0; i < rows_.size(); ++i) {
                 if (!selected_[i]) continue;
                 JDF::JDFRunList part = appendFilePart(runList, next, rows_[i].part->url, L"application/pdf", CONTENT_CONTENT);
