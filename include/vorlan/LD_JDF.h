@@ -34,6 +34,24 @@ class JDFIntegerRangeList;
 }  // namespace JDF
 
 struct LD_JDFHandles;        // the parsed ticket's handles (parser, nodes, resources)
+
+// Owns one worker's ticket handles. A copy gets handles of its own that share the ticket document
+// (the parser stays with the original); a move takes them over and leaves none behind.
+class VORLAN_API LD_TicketHandles {
+public:
+    LD_TicketHandles();
+    ~LD_TicketHandles();
+    LD_TicketHandles(const LD_TicketHandles& other);
+    LD_TicketHandles(LD_TicketHandles&& other) noexcept;
+    LD_TicketHandles& operator=(const LD_TicketHandles& other);
+    LD_TicketHandles& operator=(LD_TicketHandles&& other) noexcept;
+    LD_JDFHandles* operator->() const { return handles_; }
+    LD_JDFHandles& operator*() const { return *handles_; }
+    explicit operator bool() const { return handles_ != nullptr; }
+
+private:
+    LD_JDFHandles* handles_;
+};
 struct ZippedJDFFileSystem;  // per-job file context and PDF session flag
 struct _kvXmlNode;           // node of the XML document tree
 
@@ -265,7 +283,7 @@ public:
     char* jobFolder = nullptr;  // borrowed from the host
     LD_PDF* inputPDF = nullptr;
     ZippedJDFFileSystem* zipFileSystem = nullptr;
-    LD_JDFHandles* ticket = nullptr;  // parser, rootNode, processNode and the resource elements
+    LD_TicketHandles ticket;  // parser, rootNode, processNode and the resource elements
     std::vector<LD_AuditData*> auditPool;
     int32_t numberOfLogicalPages = 0;
     int32_t numberOfLogicalDocs = 1;
@@ -318,8 +336,7 @@ public:
     std::vector<bool> pageSelection;
 
 private:
-    void copyFrom(const LD_JDF& other);
-    void moveFrom(LD_JDF& other) noexcept;
+    // Releases what this worker owns when it is the last one sharing its records.
     void destroy() noexcept;
     LDError exitWith(LDError code);
     // Copies of one worker share their records; the last one destroyed releases them.

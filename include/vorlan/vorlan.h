@@ -15,19 +15,25 @@
 extern "C" {
 #endif
 
-/* Result codes of every operation (LDError). Values 2, 5, 7 and 10 are never produced. */
-typedef enum LDError {
-    LD_OK = 0,                      /* success */
-    LD_FAILED = 1,                  /* general failure */
-    LD_QUERY_TARGET_ABSENT = 3,     /* a query named a PDF, node type or process that does not exist */
-    LD_JDF_UNUSABLE = 4,            /* the ticket cannot be used, or its layout is automated */
-    LD_JDF_RESOURCE_MISSING = 6,    /* a queried process node or resource is absent */
-    LD_FILE_NOT_FOUND = 8,          /* data file of no known kind, or a PDF is missing */
-    LD_REFERENCE_OUT_OF_RANGE = 9,  /* a pdfIndex or ordinal names nothing */
-    LD_PDF_CONVERSION_FAILED = 11,  /* converting a PDF for the versions failed */
-    LD_INVALID_INPUT = 12,          /* the data file is neither folder, compressed file nor PDF */
-    LD_JDF_WRITE_FAILED = 13        /* building or writing the new ticket failed */
-} LDError;
+/*
+ * Result codes of every operation (LDError): X(name, value, meaning) for each, the one table the
+ * host's messages and the README's table are made from. Values 2, 5, 7 and 10 are never produced.
+ */
+#define VORLAN_RESULT_CODES(X)                                                                          \
+    X(LD_OK, 0, "success")                                                                              \
+    X(LD_FAILED, 1, "general failure (description not well-formed, expansion or die-cut failure, ...)") \
+    X(LD_QUERY_TARGET_ABSENT, 3, "a query named a PDF, node type or process that does not exist")       \
+    X(LD_JDF_UNUSABLE, 4, "the ticket cannot be used, or its layout is automated (copied unchanged)")   \
+    X(LD_JDF_RESOURCE_MISSING, 6, "a queried process node or resource is absent")                       \
+    X(LD_FILE_NOT_FOUND, 8, "data file of no known kind, or a PDF of the job is missing")               \
+    X(LD_REFERENCE_OUT_OF_RANGE, 9, "the description names a PDF or ordinal that does not exist")       \
+    X(LD_PDF_CONVERSION_FAILED, 11, "converting a PDF for the versions failed")                         \
+    X(LD_INVALID_INPUT, 12, "the data file is missing or of no usable kind")                            \
+    X(LD_JDF_WRITE_FAILED, 13, "building or writing the new ticket failed")
+
+#define VORLAN_RESULT_ENUMERATOR(name, value, meaning) name = value,
+typedef enum LDError { VORLAN_RESULT_CODES(VORLAN_RESULT_ENUMERATOR) } LDError;
+#undef VORLAN_RESULT_ENUMERATOR
 
 /* Progress callback: stored with the worker, never called. */
 typedef int (*ProgressCallback)(float progress, void* userData);

@@ -165,6 +165,14 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
             LD_SetTextBuffer(inputPDF->mimeType, L"application/pdf");
             inputPDF->status = 7;
             std::free(found);
+            // The description was read before the PDF was found: its layers, kept under no PDF,
+            // are this PDF's.
+            auto unbound = layerDataMap.find(nullptr);
+            if (unbound != layerDataMap.end()) {
+                XMLLayerData* layers = unbound->second;
+                layerDataMap.erase(unbound);
+                layerDataMap[inputPDF] = layers;
+            }
         }
     }
 

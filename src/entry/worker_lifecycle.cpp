@@ -1,11 +1,33 @@
 // Construction, copying and destruction of the worker.
 #include <cstdlib>
+#include <new>
+#include <utility>
 
 #include "jdf/ticket_handles.h"
 #include "pdf/zipped_jdf_file_system.h"
 #include "vorlan/LD_JDF.h"
 
-LD_JDF::LD_JDF() : ticket(new LD_JDFHandles), recordShare_(std::make_shared<int>(0)) {}
+LD_TicketHandles::LD_TicketHandles() : handles_(new LD_JDFHandles) {}
+LD_TicketHandles::~LD_TicketHandles() { delete handles_; }
+LD_TicketHandles::LD_TicketHandles(const LD_TicketHandles& other)
+    : handles_(other.handles_ ? new LD_JDFHandles(*other.handles_) : new LD_JDFHandles) {}
+LD_TicketHandles::LD_TicketHandles(LD_TicketHandles&& other) noexcept : handles_(other.handles_) {
+    other.handles_ = nullptr;
+}
+LD_TicketHandles& LD_TicketHandles::operator=(const LD_TicketHandles& other) {
+    if (this != &other) *this = LD_TicketHandles(other);
+    return *this;
+}
+LD_TicketHandles& LD_TicketHandles::operator=(LD_TicketHandles&& other) noexcept {
+    if (this != &other) {
+        delete handles_;
+        handles_ = other.handles_;
+        other.handles_ = nullptr;
+    }
+    return *this;
+}
+
+LD_JDF::LD_JDF() : recordShare_(std::make_shared<int>(0)) {}
 
 LD_JDF::LD_JDF(int (*progress)(float, void*), int (*filePath)(char*, int, void*), void* data) : LD_JDF() {
     ProgressCallback = progress;
@@ -15,142 +37,24 @@ LD_JDF::LD_JDF(int (*progress)(float, void*), int (*filePath)(char*, int, void*)
 
 LD_JDF::~LD_JDF() { destroy(); }
 
-// Copies share the records (pointer lists are copied, not the records) and the ticket document.
-LD_JDF::LD_JDF(const LD_JDF& other) { copyFrom(other); }
-
-LD_JDF::LD_JDF(LD_JDF&& other) noexcept { moveFrom(other); }
+// Every member copies and moves as what it is: callbacks, scalars and borrowed texts as values,
+// record lists as pointer lists (the records are shared, and released by the last worker that
+// shares them: recordShare_), the ticket handles as handles of the same document. A moved-from
+// worker shares nothing any more and releases nothing.
+LD_JDF::LD_JDF(const LD_JDF& other) = default;
+LD_JDF::LD_JDF(LD_JDF&& other) noexcept = default;
 
 LD_JDF& LD_JDF::operator=(const LD_JDF& other) {
-    if (this != &other) {
-        destroy();
-        copyFrom(other);
-    }
+    if (this != &other) *this = LD_JDF(other);
     return *this;
 }
 
 LD_JDF& LD_JDF::operator=(LD_JDF&& other) noexcept {
     if (this != &other) {
-        destroy();
-        moveFrom(other);
+        this->~LD_JDF();
+        new (this) LD_JDF(std::move(other));
     }
     return *this;
-}
-
-void LD_JDF::copyFrom(const LD_JDF& other) {
-    LD_JDFHandles* handles = other.ticket ? new LD_JDFHandles(*other.ticket) : new LD_JDFHandles;
-    // Plain memberwise copy of everything, then the members that need care.
-    ProgressCallback = other.ProgressCallback;
-    FilePathCallback = other.FilePathCallback;
-    userData = other.userData;
-    inputType = other.inputType;
-    jobHasTicket = other.jobHasTicket;
-    jdfPath = other.jdfPath;
-    jobFolder = other.jobFolder;
-    inputPDF = other.inputPDF;
-    zipFileSystem = other.zipFileSystem;
-    ticket = handles;
-    auditPool = other.auditPool;
-    numberOfLogicalPages = other.numberOfLogicalPages;
-    numberOfLogicalDocs = other.numberOfLogicalDocs;
-    contentPDFs = other.contentPDFs;
-    markPDFs = other.markPDFs;
-    layerNameList = other.layerNameList;
-    nestedComponentList = other.nestedComponentList;
-    placedObjectCount = other.placedObjectCount;
-    contentObjectCount = other.contentObjectCount;
-    markObjectCount = other.markObjectCount;
-    signatures = other.signatures;
-    sheets = other.sheets;
-    surfaces = other.surfaces;
-    contentObjects = other.contentObjects;
-    markObjects = other.markObjects;
-    numberOfSignatures = other.numberOfSignatures;
-    numberOfSheets = other.numberOfSheets;
-    numberOfSurfaces = other.numberOfSurfaces;
-    m_OrdinalTable = other.m_OrdinalTable;
-    contentObjectOrdinalMap = other.contentObjectOrdinalMap;
-    m_InterpretingParams = other.m_InterpretingParams;
-    contentRuns = other.contentRuns;
-    markRuns = other.markRuns;
-    renderingParams = other.renderingParams;
-    mediaSettings = other.mediaSettings;
-    digitalPrintingParams = other.digitalPrintingParams;
-    layerDataMap = other.layerDataMap;
-    versions = other.versions;
-    m_XMLDieCuts = other.m_XMLDieCuts;
-    lastError = other.lastError;
-    initializationTime = other.initializationTime;
-    defaultLayerMode = other.defaultLayerMode;
-    exportMode = other.exportMode;
-    pageRange = other.pageRange;
-    pageRangeMode = other.pageRangeMode;
-    surfaceVersions = other.surfaceVersions;
-    jobNumber = other.jobNumber;
-    printDieLine = other.printDieLine;
-    technicalInkMap = other.technicalInkMap;
-    dieInkMap = other.dieInkMap;
-    dataPath = other.dataPath;
-    eskoInksFound = other.eskoInksFound;
-    dieCutDefined = other.dieCutDefined;
-    dieEnabled = other.dieEnabled;
-    autoDieControl = other.autoDieControl;
-    outputJdfPath = other.outputJdfPath;
-    ticketDataPath = other.ticketDataPath;
-    pageSelection = other.pageSelection;
-    recordShare_ = other.recordShare_;
-    jobAttributeValue_ = other.jobAttributeValue_;
-}
-
-void LD_JDF::moveFrom(LD_JDF& other) noexcept {
-    copyFrom(other);  // vectors and maps below are then taken over, leaving other empty
-    recordShare_ = std::move(other.recordShare_);
-    other.recordShare_ = std::make_shared<int>(0);
-    if (other.ticket) ticket->parser = std::move(other.ticket->parser);
-    auditPool = std::move(other.auditPool);
-    contentPDFs = std::move(other.contentPDFs);
-    markPDFs = std::move(other.markPDFs);
-    layerNameList = std::move(other.layerNameList);
-    nestedComponentList = std::move(other.nestedComponentList);
-    signatures = std::move(other.signatures);
-    sheets = std::move(other.sheets);
-    surfaces = std::move(other.surfaces);
-    contentObjects = std::move(other.contentObjects);
-    markObjects = std::move(other.markObjects);
-    m_OrdinalTable = std::move(other.m_OrdinalTable);
-    m_InterpretingParams = std::move(other.m_InterpretingParams);
-    contentRuns = std::move(other.contentRuns);
-    markRuns = std::move(other.markRuns);
-    layerDataMap = std::move(other.layerDataMap);
-    versions = std::move(other.versions);
-    m_XMLDieCuts = std::move(other.m_XMLDieCuts);
-    surfaceVersions = std::move(other.surfaceVersions);
-    technicalInkMap = std::move(other.technicalInkMap);
-    dieInkMap = std::move(other.dieInkMap);
-    other.auditPool.clear();
-    other.contentPDFs.clear();
-    other.markPDFs.clear();
-    other.layerNameList.clear();
-    other.nestedComponentList.clear();
-    other.signatures.clear();
-    other.sheets.clear();
-    other.surfaces.clear();
-    other.contentObjects.clear();
-    other.markObjects.clear();
-    other.m_OrdinalTable.clear();
-    other.m_InterpretingParams.clear();
-    other.contentRuns.clear();
-    other.markRuns.clear();
-    other.layerDataMap.clear();
-    other.versions.clear();
-    other.m_XMLDieCuts.clear();
-    other.surfaceVersions.clear();
-    other.technicalInkMap.clear();
-    other.dieInkMap.clear();
-    other.inputPDF = nullptr;
-    other.zipFileSystem = nullptr;
-    other.jdfPath = nullptr;
-    other.dataPath = nullptr;
-    other.ticketDataPath = nullptr;
 }
 
 void LD_JDF::destroy() noexcept {
@@ -165,8 +69,6 @@ void LD_JDF::destroy() noexcept {
     }
     jdfPath = dataPath = ticketDataPath = nullptr;
     zipFileSystem = nullptr;
-    delete ticket;
-    ticket = nullptr;
     recordShare_.reset();
 }
 

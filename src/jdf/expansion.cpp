@@ -155,9 +155,9 @@ LDError LD_JDF::createRunListAndInterpretingParamPairs(bool hasTicket) {
             if (!run) return LD_FAILED;
             XMLLayerData* layers = nullptr;
             if (run->pdf && !layerDataMap.empty()) {
+                // A PDF the description does not cover keeps its own switches (none here).
                 auto it = layerDataMap.find(run->pdf);
-                if (it == layerDataMap.end() || !it->second) return LD_FAILED;  // a PDF the description does not cover
-                layers = it->second;
+                if (it != layerDataMap.end()) layers = it->second;
             }
             auto* params = new LD_OCG_InterpretingParams;
             if (layers) {
@@ -180,12 +180,11 @@ LDError LD_JDF::createRunListAndInterpretingParamPairs(bool hasTicket) {
     // Paths C and D: the versions, in document order.
     const bool withLayout = hasTicket && layout;
     std::unique_ptr<LayoutExpansion> expansion;
-    if (withLayout) {
-        if (surfaces.empty()) return LD_FAILED;
-        expansion = std::make_unique<LayoutExpansion>(*this);
-    }
+    if (withLayout) expansion = std::make_unique<LayoutExpansion>(*this);
     for (XMLVersionData* version : versions) {
         if (!version || !version->enabled || version->surfaces.empty()) continue;
+        // A version to print needs a layout surface for each of its entries.
+        if (withLayout && surfaces.empty()) return LD_FAILED;
         for (XMLSurfaceData* entry : version->surfaces) {
             if (!entry) continue;
             if (withLayout) {

@@ -248,7 +248,7 @@ private:
     // Puts the surface into its side's slot; a surface already there stays in the surface
     // list and is kept alive by the ticket handles.
     void place(LD_Surface*& slot, LD_Surface* surface) {
-        if (slot) w_.ticket->displacedSurfaces.emplace_back(slot);
+        if (slot) w_.ticket->displacedSurfaces->emplace_back(slot);
         slot = surface;
     }
 

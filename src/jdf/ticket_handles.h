@@ -25,8 +25,10 @@ struct LD_JDFHandles {
     // Texts handed out by the node queries; valid until the next such query.
     std::vector<std::wstring> queryTexts;
     // Surfaces a later surface of the same side pushed out of their sheet's slot: they stay in
-    // the surface list, and are owned here (the sheet owns only its front and back).
-    std::vector<std::unique_ptr<LD_Surface>> displacedSurfaces;
+    // the surface list, and are owned here (the sheet owns only its front and back). Records, so
+    // copies of a worker share them; the layout's release frees them.
+    std::shared_ptr<std::vector<std::unique_ptr<LD_Surface>>> displacedSurfaces =
+        std::make_shared<std::vector<std::unique_ptr<LD_Surface>>>();
 
     LD_JDFHandles() = default;
     // Copies share the document; the parser stays with the original.
@@ -35,5 +37,6 @@ struct LD_JDFHandles {
           interpretingParamsElement(other.interpretingParamsElement),
           renderingParamsElement(other.renderingParamsElement),
           digitalPrintingParamsElement(other.digitalPrintingParamsElement),
-          runListElement(other.runListElement), ticketHasLayout(other.ticketHasLayout) {}
+          runListElement(other.runListElement), ticketHasLayout(other.ticketHasLayout),
+          displacedSurfaces(other.displacedSurfaces) {}
 };

@@ -30,10 +30,7 @@ void PdfOnlyProcessingJdf::buildSeparationLists() {
     all_.clear();
     die_.clear();
     switchedOff_.clear();
-    // A description read before the job's PDF was found (a folder without ticket) keeps its
-    // layers under no PDF: they are still the layers of the job's one PDF.
     auto layers = w.layerDataMap.find(w.inputPDF);
-    if (layers == w.layerDataMap.end()) layers = w.layerDataMap.find(nullptr);
     if (layers != w.layerDataMap.end() && layers->second)
         for (const wchar_t* name : layers->second->sepOCGNames) all_.push_back(vorlan::os::narrow(name));
 

@@ -1,11 +1,13 @@
 // Release of the worker's records: one function per owner list.
 #include <cstdlib>
 
+#include "jdf/ticket_handles.h"
 #include "vorlan/LD_JDF.h"
 
 void LD_JDF::releaseLayout() {
     for (LD_Signature* signature : signatures) delete signature;  // frees sheets, surfaces, objects
     signatures.clear();
+    if (ticket) ticket->displacedSurfaces->clear();
     sheets.clear();
     surfaces.clear();
     contentObjects.clear();

@@ -1,6 +1,8 @@
 // Saving documents: name protection, atomic linearised save, output path preparation.
 #include "pdf/pdf_save.h"
 
+#include "platform/os/file_system.h"
+
 #include <qpdf/QPDFWriter.hh>
 
 #include <cstdio>
@@ -120,37 +122,31 @@ std::filesystem::path prepareOutputPath(const std::string& path) {
 }
 
 bool saveDocument(QPDF& pdf, const std::filesystem::path& path, bool linearise) {
-    namespace fs = std::filesystem;
     if (path.empty()) return false;
-    fs::path temporary = path;
-    temporary += ".vorlan-" + std::to_string(::getpid()) + ".tmp";
-    bool written = false;
-    try {
-        protectNumberSignsInNames(pdf);
-        QPDFWriter writer(pdf, temporary.c_str());
-        writer.setLinearization(linearise);
-        writer.setDeterministicID(true);
-        writer.write();
-        written = true;
-    } catch (const std::exception&) {
-    }
+    bool protectedNames = false;
+    const bool saved = vorlan::os::replaceFileAtomically(path, [&](int fd) {
+        FILE* file = ::fdopen(::dup(fd), "wb");
+        if (!file) return false;
+        bool written = false;
+        try {
+            protectNumberSignsInNames(pdf);
+            protectedNames = true;
+            QPDFWriter writer(pdf, path.c_str(), file, false);
+            writer.setLinearization(linearise);
+            writer.setDeterministicID(true);
+            writer.write();
+            written = true;
+        } catch (const std::exception&) {
+        }
+        return (std::fclose(file) == 0) && written;
+    });
+    if (!protectedNames) return saved;
     try {
         restoreNumberSignsInNames(pdf);
     } catch (const std::exception&) {
-        written = false;
-    }
-    if (!written) {
-        std::error_code ec;
-        fs::remove(temporary, ec);
         return false;
     }
-    std::error_code ec;
-    fs::rename(temporary, path, ec);
-    if (ec) {
-        fs::remove(temporary, ec);
-        return false;
-    }
-    return true;
+    return saved;
 }
 
 }  // namespace vorlan::pdf

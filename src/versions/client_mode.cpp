@@ -12,10 +12,11 @@ namespace {
 
 using vorlan::versions::NameCounts;
 
-// Removes every OCG of one kind except those named in keep: the name, its display name at the
-// same position, and its first entry in each default list.
+// Removes every OCG of one kind except those named in keep: the name and its display name at the
+// same position, and, when a die decides what stays, its first entry in each default list (without
+// a die the default switches stay for the ticket's own switches).
 void pruneKind(XMLLayerData& layers, std::vector<wchar_t*>& ocgNames, std::vector<wchar_t*>& displayNames,
-               const NameCounts& keep) {
+               const NameCounts& keep, bool pruneDefaults) {
     std::vector<bool> drop(ocgNames.size());
     NameCounts removed;
     for (size_t i = 0; i < ocgNames.size(); ++i) {
@@ -23,8 +24,10 @@ void pruneKind(XMLLayerData& layers, std::vector<wchar_t*>& ocgNames, std::vecto
         drop[i] = true;
         removed.add(ocgNames[i]);
     }
-    removed.removeFrom(layers.defaultOnOCGNames);
-    removed.removeFrom(layers.defaultOffOCGNames);
+    if (pruneDefaults) {
+        removed.removeFrom(layers.defaultOnOCGNames);
+        removed.removeFrom(layers.defaultOffOCGNames);
+    }
     // Nothing below allocates: the parallel lists shrink together.
     size_t keptNames = 0, keptDisplayNames = 0;
     for (size_t i = 0; i < ocgNames.size(); ++i) {
@@ -62,9 +65,9 @@ LDError LD_JDF::applyClientModeChangesToXMLBufferData() {
         for (auto& [pdf, layers] : layerDataMap) {
             if (!layers) continue;
             if (layerMode)
-                pruneKind(*layers, layers->sepOCGNames, layers->sepDisplayNames, keep);
+                pruneKind(*layers, layers->sepOCGNames, layers->sepDisplayNames, keep, die != nullptr);
             else
-                pruneKind(*layers, layers->layerOCGNames, layers->layerDisplayNames, keep);
+                pruneKind(*layers, layers->layerOCGNames, layers->layerDisplayNames, keep, die != nullptr);
         }
     } catch (const std::bad_alloc&) {
         lastError = LD_FAILED;

@@ -37,6 +37,13 @@ TEST(Cli, ConsumeExitsWithTheResultCodeAndNamesIt) {
     EXPECT_EQ(run("consume --json " + (dir / "job3.0001").string() + " " + (dir / "out.jdf").string(), &output), 8);
     EXPECT_NE(output.find("\"name\": \"LD_FILE_NOT_FOUND\""), std::string::npos) << output;
     EXPECT_NE(output.find("\"ticketWritten\": false"), std::string::npos) << output;
+
+    // A ticket job: the reader's own lines go to standard error, standard output is one document.
+    writeFile(dir / "job4D0001" / "t.jdf", R"(<JDF xmlns="http://www.CIP4.org/JDFSchema_1_1" ID="n" Type="Imposition"/>)");
+    writeFile(dir / "job4.0001", "job");
+    EXPECT_EQ(runCommand(cli() + " consume --json " + (dir / "job4.0001").string() + " " + (dir / "out4.jdf").string() +
+                         " 2>/dev/null | python3 -c 'import json,sys; json.load(sys.stdin)'"),
+              0);
 }
 
 TEST(Cli, JobAttributesRoundTripThroughTheStore) {

@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 
 #include "test_support.h"
+#include "vorlan/vorlan.h"
 
 TEST(SharedLibrary, ExportsOnlyTheEntryPointsAndTheTwoClasses) {
     if (!vorlan::test::haveProgram("nm")) GTEST_SKIP() << "nm not installed";
@@ -24,4 +25,16 @@ TEST(SharedLibrary, ExportsOnlyTheEntryPointsAndTheTwoClasses) {
     }
     EXPECT_EQ(cSymbols, (std::set<std::string>{"vorlan_autoimp", "vorlan_consume_job", "vorlan_is_valid_job",
                                                "vorlan_scan_xmp"}));
+}
+
+TEST(ResultCodes, TheReadmeTableIsTheHeadersTable) {
+    std::string expected;
+#define VORLAN_RESULT_ROW(name, value, meaning) \
+    expected += "| " + std::to_string(value) + " | `" #name "` | " meaning " |\n";
+    VORLAN_RESULT_CODES(VORLAN_RESULT_ROW)
+#undef VORLAN_RESULT_ROW
+    const std::string readme = vorlan::test::readFile(std::string(VORLAN_SOURCE_DIR) + "/README.md");
+    const size_t start = readme.find("| 0 | `LD_OK`");
+    ASSERT_NE(start, std::string::npos) << "README.md has no result-code table";
+    EXPECT_EQ(readme.substr(start, expected.size()), expected);
 }

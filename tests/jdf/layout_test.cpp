@@ -200,3 +200,27 @@ TEST(LayoutReader, SecondLayoutContinuesTheNumbering) {
 }
 
 }  // namespace
+
+TEST(LayoutReader, WorkersMovedAndCopiedKeepPushedOutSurfaces) {
+    // A sheet with two Front surfaces: the first is pushed out of its slot but stays listed.
+    std::string layout = R"(<Layout ID="L" Status="Available"><Signature Name="S"><Sheet Name="A">)" +
+                         surface("Front", content(0)) + surface("Front", content(1)) + "</Sheet></Signature></Layout>";
+    ReadTicket t(jdfTicket(layout, kLayoutLink));
+    ASSERT_EQ(t.result, LD_OK);
+    auto pushedOutOrd = [](LD_JDF& w) { return w.getSurfaceByIndex(0)->contentObjects.at(0)->Ord; };
+    // Moved: the moved-from worker is destroyed first, and the new one still reads its surfaces.
+    auto moved = std::make_unique<LD_JDF>(std::move(*t.worker));
+    t.worker.reset();
+    EXPECT_EQ(moved->JDF_GetNumberOfSurfaces(), 2);
+    EXPECT_EQ(pushedOutOrd(*moved), 0);
+    // Copied: the records are shared, and whichever is destroyed last releases them.
+    auto copy = std::make_unique<LD_JDF>(*moved);
+    moved.reset();
+    EXPECT_EQ(pushedOutOrd(*copy), 0);
+    LD_JDF assigned;
+    assigned = *copy;
+    copy.reset();
+    EXPECT_EQ(pushedOutOrd(assigned), 0);
+    assigned = LD_JDF();  // releases the records
+    EXPECT_EQ(assigned.JDF_GetNumberOfSurfaces(), 0);
+}

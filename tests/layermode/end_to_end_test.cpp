@@ -171,7 +171,8 @@ TEST_F(LayerMode, BarePdfWithoutVersionsUsesTheDefaultSwitches) {
     TicketView t = run(job, "Odd");
     EXPECT_EQ(t.count("//InterpretingParams[@Run]"), 2u);  // pages 1 and 3
     EXPECT_EQ(t.attr("//RunList[@Run='1']", "Pages"), "2");
-    EXPECT_EQ(t.switches(0), "+English +KVVersionSpecialOCGName -German");
+    // Without a die cut the separation Varnish keeps its default switch.
+    EXPECT_EQ(t.switches(0), "+English +Varnish +KVVersionSpecialOCGName -German");
 }
 
 TEST_F(LayerMode, FailedSaveIsReportedAndLeavesNothing) {
@@ -190,9 +191,17 @@ TEST_F(LayerMode, VersionOfAnObjectWithoutContentPageIsOutOfRange) {
     EXPECT_FALSE(fs::exists(job.output));
 }
 
-TEST_F(LayerMode, PdfWithoutLayerDataFailsInsteadOfAborting) {
+TEST_F(LayerMode, PdfWithoutLayerDataPrintsWithItsOwnSwitches) {
     TicketSpec shape;
     shape.pdfs = {"a.pdf", "b.pdf"};  // the description describes only the first
     Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLanguages, {}));
-    EXPECT_EQ(consume(job), 1);
+    TicketView t = run(job);
+    for (auto part : t.all("/JDF/ResourcePool/RunList/RunList[@Run]")) {
+        const std::string url = part.node().child("LayoutElement").child("FileSpec").attribute("URL").value();
+        const int ordinal = part.node().attribute("Run").as_int();
+        EXPECT_EQ(t.switches(ordinal), url.find("b.pdf") != std::string::npos
+                                           ? "+KVVersionSpecialOCGName"
+                                           : "+English +Varnish +KVVersionSpecialOCGName -German")
+            << url;
+    }
 }

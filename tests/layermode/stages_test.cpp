@@ -74,6 +74,45 @@ TEST(Expansion, ParametersMadeBeforeExpansionAreRefused) {
     EXPECT_EQ(w.createRunListAndInterpretingParamPairs(true), LD_FAILED);
 }
 
+TEST(Expansion, TicketJobsThatAreNotFailures) {
+    // Two content PDFs, the description covering only the first: the second gets no switches.
+    LD_JDF w;
+    w.jobHasTicket = true;
+    for (const wchar_t* name : {L"/jobs/a.pdf", L"/jobs/b.pdf"}) {
+        auto* pdf = new LD_PDF;
+        LD_SetTextBuffer(pdf->nativePath, name);
+        w.contentPDFs.push_back(pdf);
+        auto* run = new LD_Run;
+        run->pdf = pdf;
+        w.contentRuns.push_back(run);
+    }
+    auto* layers = new XMLLayerData;
+    layers->defaultOnOCGNames = names({L"Art"});
+    w.layerDataMap[w.contentPDFs[0]] = layers;
+    ASSERT_EQ(w.createRunListAndInterpretingParamPairs(true), LD_OK);
+    ASSERT_EQ(w.m_InterpretingParams.size(), 2u);
+    EXPECT_EQ(joined(w.m_InterpretingParams[0]->m_OCGOn), L"Art");
+    EXPECT_TRUE(w.m_InterpretingParams[1]->m_OCGOn.empty() && w.m_InterpretingParams[1]->m_OCGOff.empty());
+
+    // A layout without surfaces is no failure while no version is printed; it is with one.
+    LD_JDF v;
+    JDF::JDFDoc doc(0);
+    v.jobHasTicket = true;
+    v.ticket->layoutElement = doc.GetRoot().AppendElement(L"Layout");
+    for (bool enabled : {false, true}) {
+        auto* version = new XMLVersionData;
+        version->enabled = enabled;
+        version->surfaces.push_back(new XMLSurfaceData);
+        v.versions.push_back(version);
+        EXPECT_EQ(v.createRunListAndInterpretingParamPairs(true), enabled ? LD_FAILED : LD_OK);
+    }
+    v.releaseVersions();
+    auto* empty = new XMLVersionData;  // enabled, but without surfaces
+    empty->enabled = true;
+    v.versions.push_back(empty);
+    EXPECT_EQ(v.createRunListAndInterpretingParamPairs(true), LD_OK);
+}
+
 TEST(Expansion, VersionSwitchesMergeLayersBeforeSeparations) {
     BarePdf job(1);
     auto* version = new XMLVersionData;

@@ -50,9 +50,9 @@ TEST_F(ClientModeTest, SeparationModeWithoutDieDropsEveryLayer) {
     EXPECT_EQ(names(object().sepNameOff), Names{L"White"});
     XMLLayerData& record = layers(nullptr);
     EXPECT_TRUE(record.layerOCGNames.empty() && record.layerDisplayNames.empty());
-    // Layer names leave the default lists too; separation data is untouched.
-    EXPECT_EQ(names(record.defaultOnOCGNames), Names{L"Cyan"});
-    EXPECT_EQ(names(record.defaultOffOCGNames), (Names{L"CutContour", L"White"}));
+    // Without a die the default switches stay (the ticket writes them); separation data is untouched.
+    EXPECT_EQ(names(record.defaultOnOCGNames), (Names{L"Base", L"Cyan"}));
+    EXPECT_EQ(names(record.defaultOffOCGNames), (Names{L"Cut", L"CutContour", L"White"}));
     EXPECT_EQ(names(record.sepOCGNames), (Names{L"Cyan", L"CutContour", L"White"}));
     EXPECT_EQ(names(record.sepDisplayNames), (Names{L"C", L"Contour", L"W"}));
     EXPECT_EQ(names(record.nestedLayerOCGNames), Names{L"Inner"});  // nested lists stay
@@ -88,13 +88,14 @@ TEST_F(ClientModeTest, LayerModeWithoutDieDropsEverySeparation) {
     readAndPrune(true, "");
     XMLLayerData& record = layers(nullptr);
     EXPECT_TRUE(record.sepOCGNames.empty() && record.sepDisplayNames.empty());
-    EXPECT_EQ(names(record.defaultOnOCGNames), Names{L"Base"});
-    EXPECT_EQ(names(record.defaultOffOCGNames), Names{L"Cut"});
+    EXPECT_EQ(names(record.defaultOnOCGNames), (Names{L"Base", L"Cyan"}));
+    EXPECT_EQ(names(record.defaultOffOCGNames), (Names{L"Cut", L"CutContour", L"White"}));
 }
 
 TEST_F(ClientModeTest, ANameTwiceInADefaultListLosesOnlyOneEntry) {
     ASSERT_EQ(read(R"(<OptionalContentGroupData>
         <OptionalLayer OCGName="Dup"/><OptionalLayer OCGName="dup"/><OptionalLayer OCGName="Keep" isSep="true"/>
+        <DieCut><Surface dieLayerInternalNames="Cut"/></DieCut>
       </OptionalContentGroupData>)"),
               LD_OK);
     XMLLayerData& record = layers(nullptr);

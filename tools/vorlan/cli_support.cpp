@@ -1,5 +1,7 @@
 #include "cli_support.h"
 
+#include <unistd.h>
+
 #include <algorithm>
 #include <cstdio>
 
@@ -87,17 +89,35 @@ void Report::open(const std::string& key, char bracket) {
 
 void Report::emit(const std::string& key, const std::string& value) {
     separator();
-    if (json_) std::printf("%s%s: %s", indent().c_str(), jsonString(key).c_str(), value.c_str());
+    if (json_ && !stack_.empty() && stack_.back().array) std::printf("%s%s", indent().c_str(), value.c_str());
+    else if (json_) std::printf("%s%s: %s", indent().c_str(), jsonString(key).c_str(), value.c_str());
     else std::printf("%s%s: %s\n", indent().c_str(), key.c_str(), value.c_str());
 }
 
-int reportResult(int code, bool json) {
-    if (json)
-        std::printf("{\"result\": %d, \"name\": %s, \"meaning\": %s}\n", code, jsonString(resultName(code)).c_str(),
-                    jsonString(resultMeaning(code)).c_str());
-    else
-        std::printf("result: %d %s (%s)\n", code, resultName(code), resultMeaning(code));
-    return code < 0 ? 255 : code;
+void Report::result(int code) {
+    if (!json_) {
+        std::printf("%sresult: %d %s (%s)\n", indent().c_str(), code, resultName(code), resultMeaning(code));
+        return;
+    }
+    field("result", static_cast<long long>(code));
+    field("name", resultName(code));
+    field("meaning", resultMeaning(code));
+}
+
+int exitStatus(int code) { return code < 0 ? 255 : code; }
+
+StdoutToStderr::StdoutToStderr(bool active) {
+    if (!active) return;
+    std::fflush(stdout);
+    saved_ = ::dup(STDOUT_FILENO);
+    if (saved_ >= 0) ::dup2(STDERR_FILENO, STDOUT_FILENO);
+}
+
+StdoutToStderr::~StdoutToStderr() {
+    if (saved_ < 0) return;
+    std::fflush(stdout);
+    ::dup2(saved_, STDOUT_FILENO);
+    ::close(saved_);
 }
 
 }  // namespace vorlan::cli

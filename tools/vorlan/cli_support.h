@@ -14,8 +14,21 @@ bool wantsHelp(const Args& args);
 std::string takeOption(Args& args, const std::string& name, const std::string& fallback);
 // Removes "--name" from args; true when it was there.
 bool takeFlag(Args& args, const std::string& name);
-// Prints the code's name and meaning (text or JSON) and returns the code as exit status.
-int reportResult(int code, bool json);
+// The exit status of a result code (255 for -1).
+int exitStatus(int code);
+
+// While it lives, what is written to standard output goes to standard error: the library's own
+// lines stay off a machine-readable standard output.
+class StdoutToStderr {
+public:
+    explicit StdoutToStderr(bool active);
+    ~StdoutToStderr();
+    StdoutToStderr(const StdoutToStderr&) = delete;
+    StdoutToStderr& operator=(const StdoutToStderr&) = delete;
+
+private:
+    int saved_ = -1;
+};
 // Escapes text for a JSON string literal.
 std::string jsonString(const std::string& text);
 
@@ -32,6 +45,8 @@ public:
     void field(const std::string& key, long long value) { emit(key, std::to_string(value)); }
     void field(const std::string& key, double value);
     void flag(const std::string& key, bool value) { emit(key, value ? "true" : "false"); }
+    // The result code: fields result, name and meaning (JSON), or "result: CODE NAME (MEANING)".
+    void result(int code);
 
 private:
     struct Level {

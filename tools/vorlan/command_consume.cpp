@@ -83,22 +83,30 @@ int runConsume(Args args) {
 
     std::vector<char> outputBuffer(output.begin(), output.end());
     outputBuffer.push_back('\0');
-    int code = vorlan_consume_job(dataFile.c_str(), impinfo.empty() ? nullptr : impinfo.c_str(), outputBuffer.data(),
+    int code;
+    {
+        StdoutToStderr quiet(json);
+        code = vorlan_consume_job(dataFile.c_str(), impinfo.empty() ? nullptr : impinfo.c_str(), outputBuffer.data(),
                                   jobFolder.c_str(), pageRange.c_str(), nullptr, nameNextOutputFile, &namer);
+    }
 
     std::error_code ec;
     bool written = fs::exists(output, ec);
+    Report r(json);
     if (json) {
-        std::printf("{\"ticket\": %s, \"ticketWritten\": %s, \"outputFiles\": [", jsonString(output).c_str(),
-                    written ? "true" : "false");
-        for (size_t i = 0; i < namer.handedOut.size(); ++i)
-            std::printf("%s%s", i ? ", " : "", jsonString(namer.handedOut[i]).c_str());
-        std::printf("]}\n");
+        r.beginObject();
+        r.field("ticket", output);
+        r.flag("ticketWritten", written);
+        r.beginArray("outputFiles");
+        for (const std::string& file : namer.handedOut) r.field("", file);
+        r.end();
     } else {
         std::printf("ticket: %s (%s)\n", output.c_str(), written ? "written" : "not written");
         for (const std::string& file : namer.handedOut) std::printf("output file: %s\n", file.c_str());
     }
-    return reportResult(code, json);
+    r.result(code);
+    if (json) r.end();
+    return exitStatus(code);
 }
 
 }  // namespace vorlan::cli

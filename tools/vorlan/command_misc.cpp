@@ -60,14 +60,19 @@ int runAutoimpose(Args args) {
     settings.settingsPath = args[0];
     settings.jdfPath = args[1];
     autoimpose::ImpositionChanges changes;
-    const bool rewritten = autoimpose::imposeTicket(settings, &changes);
+    bool rewritten;
+    {
+        StdoutToStderr quiet(json);
+        rewritten = autoimpose::imposeTicket(settings, &changes);
+    }
     Report r(json);
     r.beginObject();
     r.field("ticket", args[1]);
     r.flag("rewritten", rewritten);
     if (rewritten) reportChanges(r, changes);
+    r.result(rewritten ? LD_OK : LD_FAILED);
     r.end();
-    return reportResult(rewritten ? LD_OK : LD_FAILED, json);
+    return rewritten ? LD_OK : LD_FAILED;
 }
 
 int runScanXmp(Args args) {

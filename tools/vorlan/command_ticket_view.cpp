@@ -136,20 +136,10 @@ void reportOrdinals(Report& r, JDFinterface& ticket) {
     r.end();
 }
 
-// Reads the ticket; with JSON output the reader's timing line is kept off the standard output.
+// Reads the ticket; with JSON output the reader's timing line goes to standard error.
 LDError readTicket(JDFinterface& ticket, const std::string& path, bool quiet) {
-    std::fflush(stdout);
-    int saved = quiet ? dup(STDOUT_FILENO) : -1;
-    if (saved >= 0) {
-        if (std::FILE* null = std::freopen("/dev/null", "w", stdout)) (void)null;
-    }
-    LDError result = ticket.JDF_InitializeAndParseJDF(path.c_str());
-    if (saved >= 0) {
-        std::fflush(stdout);
-        dup2(saved, STDOUT_FILENO);
-        close(saved);
-    }
-    return result;
+    StdoutToStderr toStderr(quiet);
+    return ticket.JDF_InitializeAndParseJDF(path.c_str());
 }
 
 }  // namespace

@@ -1,6 +1,8 @@
 // Documents: creation of new JDF documents and atomic writing.
 #include "platform/jdf/jdf_doc.h"
 
+#include "platform/os/file_system.h"
+
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
@@ -107,26 +109,11 @@ std::string XMLDoc::ToString() const {
 
 bool XMLDoc::Write2File(const WString& fileName) const {
     if (!doc_ || fileName.empty()) return false;
-    std::string target = fileName.getUTF8();
-    std::string tmp = target + ".XXXXXX";
-    int fd = ::mkstemp(tmp.data());
-    if (fd < 0) return false;
-    // mkstemp creates 0600: keep the mode of the file being replaced, else rw-r--r--. The data
-    // reaches the disk (fsync) before the rename makes it the ticket.
-    struct stat st {};
-    ::fchmod(fd, ::stat(target.c_str(), &st) == 0 ? (st.st_mode & 07777) : 0644);
-    FdWriter writer(fd);
-    bool ok = true;
-    try {
+    return vorlan::os::replaceFileAtomically(fileName.getUTF8(), [this](int fd) {
+        FdWriter writer(fd);
         doc_->doc.save(writer, kIndent, formatFor(doc_->doc), pugi::encoding_utf8);
-    } catch (...) {
-        ok = false;
-    }
-    ok = ok && writer.ok() && ::fsync(fd) == 0;
-    ok = (::close(fd) == 0) && ok;
-    if (ok && std::rename(tmp.c_str(), target.c_str()) == 0) return true;
-    std::remove(tmp.c_str());
-    return false;
+        return writer.ok();
+    });
 }
 
 JDFDoc::JDFDoc(int type) : XMLDoc(std::make_shared<detail::DocumentState>()) {

@@ -52,24 +52,39 @@ bool copyFile(const fs::path& from, const fs::path& to) {
     return !ec;
 }
 
-bool writeFileAtomically(const fs::path& path, const std::string& bytes) {
+bool replaceFileAtomically(const fs::path& path, const std::function<bool(int fd)>& write) {
     fs::path folder = path.has_parent_path() ? path.parent_path() : fs::path(".");
     std::string pattern = (folder / ("." + path.filename().string() + ".tmpXXXXXX")).string();
     int fd = ::mkstemp(pattern.data());
     if (fd < 0) return false;
-    ::fchmod(fd, 0644);  // mkstemp makes the file private; a ticket is an ordinary file
-    size_t written = 0;
-    while (written < bytes.size()) {
-        ssize_t n = ::write(fd, bytes.data() + written, bytes.size() - written);
-        if (n < 0 && errno == EINTR) continue;
-        if (n <= 0) break;
-        written += static_cast<size_t>(n);
+    // mkstemp makes the file private: keep the mode of the file being replaced, else an ordinary
+    // file's.
+    struct stat st {};
+    ::fchmod(fd, ::stat(path.c_str(), &st) == 0 ? (st.st_mode & 07777) : 0644);
+    bool ok = false;
+    try {
+        ok = write(fd);
+    } catch (...) {
+        ok = false;
     }
-    bool ok = written == bytes.size() && ::fsync(fd) == 0;
+    ok = ok && ::fsync(fd) == 0;
     ok = (::close(fd) == 0) && ok;
     if (ok) ok = ::rename(pattern.c_str(), path.c_str()) == 0;
     if (!ok) ::unlink(pattern.c_str());
     return ok;
+}
+
+bool writeFileAtomically(const fs::path& path, const std::string& bytes) {
+    return replaceFileAtomically(path, [&bytes](int fd) {
+        size_t written = 0;
+        while (written < bytes.size()) {
+            ssize_t n = ::write(fd, bytes.data() + written, bytes.size() - written);
+            if (n < 0 && errno == EINTR) continue;
+            if (n <= 0) return false;
+            written += static_cast<size_t>(n);
+        }
+        return true;
+    });
 }
 
 TemporaryFile::TemporaryFile(const fs::path& folder, const std::string& prefix) {

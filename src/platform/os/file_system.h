@@ -3,6 +3,7 @@
 
 #include <cstdint>
 #include <filesystem>
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -33,8 +34,13 @@ std::filesystem::path homeFolder();
 // Copies a file, replacing the target. False on failure.
 bool copyFile(const std::filesystem::path& from, const std::filesystem::path& to);
 
-// Writes bytes to path atomically: a temporary file in the same folder, flushed to disk and renamed
-// over the target. False (and the target untouched) on failure.
+// Replaces path atomically with what `write` puts into the open file descriptor it is given: a
+// new file in the same folder (the mode of the file it replaces, else rw-r--r--), flushed to disk
+// and renamed over the target. False when `write` returns false or throws, or the file cannot be
+// made, flushed or renamed: the target is then untouched and no temporary file is left.
+bool replaceFileAtomically(const std::filesystem::path& path, const std::function<bool(int fd)>& write);
+
+// Writes bytes to path through replaceFileAtomically.
 bool writeFileAtomically(const std::filesystem::path& path, const std::string& bytes);
 
 // A new empty file with a name no other file has (prefix followed by six random characters) in
