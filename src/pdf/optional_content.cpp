@@ -92,7 +92,7 @@ QPDFObjectHandle findOrCreateOCG(QPDF& pdf, const std::string& name) {
         removeFrom(config.getKey("/ON"), ocg);
         QPDFObjectHandle off = ensureArray(config, "/OFF");
         if (!contains(off, ocg)) off.appendItem(ocg);
-        if (!contains(order, ocg)) order.appendItem(ocg);
+        order.appendItem(ocg);  // a group that existed is listed once more, at the end
         return ocg;
     } catch (const std::exception&) {
         return QPDFObjectHandle::newNull();

@@ -45,14 +45,14 @@ public:
 
     void finish() { variants_.finish(); }
 
-    // Annotations paint too: those not already optional join the catch-all group, so that a page
-    // with every group off shows nothing.
+    // Annotations paint too: those without optional content of their own join the catch-all
+    // group, so that a die-only page (every group off but the die) prints no stamp or form field
+    // on the die plate. An annotation's own /OC is left as it is.
     void hideAnnotations(QPDFObjectHandle page) {
         QPDFObjectHandle annots = page.getKey("/Annots");
         if (!annots.isArray()) return;
         for (QPDFObjectHandle annot : annots.aitems()) {
-            if (!annot.isDictionary()) continue;
-            if (!allSeparations_ && hasOptionalContentMembership(annot.getKey("/OC"))) continue;
+            if (!annot.isDictionary() || annot.hasKey("/OC")) continue;
             if (annot.getKey("/Subtype").isNameAndEquals("/Popup")) continue;  // shown through its parent
             annot.replaceKey("/OC", special);
         }
