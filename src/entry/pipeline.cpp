@@ -88,10 +88,11 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
         ticketDataPath = dataPath;
         LDError read = JDF_InitializeAndParseJDF(jdfPath);
         if (read == LD_JDF_UNUSABLE || read == LD_FAILED) return exitWith(read);
-        if (ticket->layoutElement.isNull()) {
+        // A ticket that came without a Layout gets a ticket of its own, whatever the reader
+        // injected to answer queries.
+        if (!ticket->ticketHasLayout) {
             LayoutInjectionProcessingJdf injection(jdfPath, dataPath, outputJdfPath, this);
-            injection.run();
-            return exitWith(LD_OK);
+            return exitWith(injection.run());
         }
         AddDieInfoFile("OrigPageCount", numberOfSurfaces);
     } else {

@@ -25,9 +25,6 @@ int PdfPositions::find(const wchar_t* url) const {
 
 void PdfPositions::add(const wchar_t* url, int position) { first_.emplace(urlKey(url), position); }
 
-namespace {
-
-// A run from a run-list element (a partition or an unpartitioned resource).
 std::unique_ptr<LD_Run> makeRun(const JDF::JDFRunList& element, int32_t runNumber, bool partition) {
     auto run = std::make_unique<LD_Run>();
     run->runNumber = runNumber;
@@ -45,6 +42,8 @@ std::unique_ptr<LD_Run> makeRun(const JDF::JDFRunList& element, int32_t runNumbe
     }
     return run;
 }
+
+namespace {
 
 // The PDF record of a run-list element's FileSpec.
 std::unique_ptr<LD_PDF> makePdf(const JDF::JDFRunList& element, LD_Status status, bool lowerCaseMime) {

@@ -17,6 +17,8 @@ struct LD_JDFHandles {
     JDF::KElement renderingParamsElement;
     JDF::KElement digitalPrintingParamsElement;
     JDF::KElement runListElement;
+    // Whether the ticket as read had a Layout of its own; one the reader injected does not count.
+    bool ticketHasLayout = false;
 
     // Look-up indexes over the model's lists; rebuilt on demand, so copies may share nothing.
     vorlan::jdf::ModelIndexes indexes;
@@ -35,6 +37,6 @@ struct LD_JDFHandles {
           interpretingParamsElement(other.interpretingParamsElement),
           renderingParamsElement(other.renderingParamsElement),
           digitalPrintingParamsElement(other.digitalPrintingParamsElement),
-          runListElement(other.runListElement),
+          runListElement(other.runListElement), ticketHasLayout(other.ticketHasLayout),
           displacedSurfaces(other.displacedSurfaces) {}
 };

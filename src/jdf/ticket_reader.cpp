@@ -231,6 +231,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
     t.processNode = JDF::JDFNode();
     t.layoutElement = t.interpretingParamsElement = t.renderingParamsElement = JDF::KElement();
     t.digitalPrintingParamsElement = t.runListElement = JDF::KElement();
+    t.ticketHasLayout = false;
 
     try {
         t.parser = std::make_unique<JDF::JDFParser>();
@@ -267,6 +268,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
         // The layout, or one injected from the run lists.
         if (!t.processNode.isNull()) {
             t.layoutElement = firstBelow(t.rootNode, L"Layout", L"*");
+            t.ticketHasLayout = !t.layoutElement.isNull();
             if (t.layoutElement.isNull()) {
                 lastError = LD_JDF_RESOURCE_MISSING;
                 JDF::JDFLayout injected;
@@ -277,6 +279,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
                 }
             }
         } else {
+            t.ticketHasLayout = !firstBelow(t.rootNode, L"Layout", L"*").isNull();
             JDF::JDFLayout injected;
             changed = true;
             if (injectLayoutNode(t.rootNode, injected)) {
@@ -341,8 +344,9 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
                 static_cast<unsigned long long>(initializationTime));
 
     // A layout with surfaces needs content pages to place on them; without any, the job
-    // cannot be versioned and is reported as unusable.
-    if (jobHasTicket && numberOfSurfaces > 0 && m_OrdinalTable.empty()) {
+    // cannot be versioned and is reported as unusable. A ticket that came without a layout is
+    // not versioned: it gets a ticket of its own from its run lists.
+    if (jobHasTicket && t.ticketHasLayout && numberOfSurfaces > 0 && m_OrdinalTable.empty()) {
         lastError = LD_JDF_UNUSABLE;
         return LD_JDF_UNUSABLE;
     }

@@ -1,6 +1,7 @@
 // The parts of the ticket reader that walk one resource each.
 #pragma once
 
+#include <memory>
 #include <string>
 #include <unordered_map>
 #include <vector>
@@ -44,6 +45,11 @@ struct RunListReading {
     const std::vector<LinkCandidate>* linkCandidates = nullptr;
     explicit RunListReading(LD_JDF& w) : worker(w), contentPositions(w.contentPDFs), markPositions(w.markPDFs) {}
 };
+
+// A content run from a run-list element (a partition or an unpartitioned resource): NPage,
+// FirstPage, SkipPage, EndOfDocument, the Run value and the Pages expanded with ToVInt(1000) (a
+// list too large to expand reads as none); IsBlank from its LayoutElement only for a partition.
+std::unique_ptr<LD_Run> makeRun(const JDF::JDFRunList& element, int32_t runNumber, bool partition);
 
 // Reads one RunList resource into runs and PDFs.
 void readRunListResource(RunListReading& reading, const JDF::JDFResource& runList);

@@ -31,6 +31,11 @@ Resource runPartition(Resource& resource, int32_t ordinal) {
     return need(Resource(resource.AddPartition(20, JDF::WString::valueOf(ordinal))));
 }
 
+// Appends the next Run partition (numbered by `next`, which moves on) for a file: a
+// LayoutElement / FileSpec with the URL and MIME type, and the KAV_tkt:VersContentType of the type.
+JDF::JDFRunList appendFilePart(JDF::JDFRunList& runList, int32_t& next, const JDF::WString& url,
+                               const wchar_t* mimeType, ContentType type);
+
 // The KAV_tkt:VersContentType text of a content type; null for a value that has none.
 const wchar_t* contentTypeText(ContentType type);
 

@@ -20,6 +20,16 @@ const wchar_t* contentTypeText(ContentType type) {
     return nullptr;
 }
 
+JDF::JDFRunList appendFilePart(JDF::JDFRunList& runList, int32_t& next, const JDF::WString& url,
+                               const wchar_t* mimeType, ContentType type) {
+    JDF::JDFRunList part = runPartition(runList, next++);
+    JDF::JDFFileSpec file = need(need(part.GetCreateLayoutElement()).GetCreateFileSpec());
+    file.SetURL(url);
+    file.SetMimeType(mimeType);
+    if (const wchar_t* text = contentTypeText(type)) setTicketAttribute(part, L"VersContentType", text);
+    return part;
+}
+
 void setTicketAttribute(JDF::KElement& element, const wchar_t* name, const JDF::WString& value) {
     element.SetAttribute(JDF::WString(L"KAV_tkt:") + name, value, kTicketExtensionNs);
 }

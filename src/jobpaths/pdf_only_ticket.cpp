@@ -16,12 +16,8 @@ void appendParts(LD_JDF& w, JDF::JDFRunList& runList, int32_t& next, const LD_Ru
     const JDF::WString url = pdfURL(w, run.pdf);
     const bool die = run.contentType != CONTENT_CONTENT;
     for (int32_t page : pages) {
-        JDF::JDFRunList part = runPartition(runList, next++);
+        JDF::JDFRunList part = appendFilePart(runList, next, url, L"application/pdf", run.contentType);
         setSinglePage(part, page);
-        JDF::JDFFileSpec file = need(need(part.GetCreateLayoutElement()).GetCreateFileSpec());
-        file.SetURL(url);
-        file.SetMimeType(L"application/pdf");
-        setTicketAttribute(part, L"VersContentType", contentTypeText(run.contentType));
         if (!die) {
             if (run.VersionName) setVersionTags(part, run.VersionName, run.VersionIndex, run.VersionCopyCount);
             continue;

@@ -68,6 +68,17 @@ TEST(Cli, ValidSaysValidOrNotValid) {
     EXPECT_EQ(output, "not valid\n");
 }
 
+TEST(Cli, InspectShowsTheLayoutGivenToATicketWithoutOne) {
+    TempDir dir;
+    writeFile(dir / "t.jdf", R"(<JDF xmlns="http://www.CIP4.org/JDFSchema_1_1" ID="n1" Type="Combined" Types="Interpreting">
+        <ResourcePool><RunList ID="R" Class="Parameter" Status="Available" PartIDKeys="Run">
+        <RunList Run="0" NPage="3"><LayoutElement><FileSpec URL="a.pdf"/></LayoutElement></RunList></RunList></ResourcePool>
+        <ResourceLinkPool><RunListLink rRef="R" Usage="Input"/></ResourceLinkPool></JDF>)");
+    std::string output;
+    EXPECT_EQ(run("inspect " + (dir / "t.jdf").string(), &output), 0);
+    EXPECT_NE(output.find("sheetCount: 3"), std::string::npos) << output;
+}
+
 TEST(Cli, BundledExampleJobsGiveVersionedTickets) {
     if (!vorlan::test::haveProgram("python3")) GTEST_SKIP() << "python3 not installed";
     TempDir dir;

@@ -123,6 +123,7 @@ TEST(CorpusTickets, CountsMatchXPathForTicketsWithPlacedObjects) {
         SCOPED_TRACE(e.file);
         LD_JDF w;
         ASSERT_EQ(readQuietly(w, file), LD_OK);
+        EXPECT_TRUE(w.ticket->ticketHasLayout);
         int injected = xpathCount(file, impositionNodes) == 0 ? 1 : 0;
         EXPECT_EQ(w.JDF_GetNumberOfSignatures(), xpathCount(file, signatures) + injected);
         EXPECT_EQ(w.JDF_GetNumberOfSheets(), xpathCount(file, sheets));

@@ -164,6 +164,7 @@ TEST(TicketReader, TicketWithoutLayoutGetsOneSheetPerPage) {
     ReadTicket t(jdfTicket(runs + media, kDocumentLink, R"(Type="Combined" Types="Interpreting Rendering")"));
     ASSERT_EQ(t.result, LD_OK);
     ASSERT_FALSE(t->ticket->layoutElement.isNull());
+    EXPECT_FALSE(t->ticket->ticketHasLayout);  // the injected one does not count
     EXPECT_EQ(t->ticket->processNode, t->ticket->rootNode);
     EXPECT_EQ(t->JDF_GetNumberOfSignatures(), 1);
     EXPECT_EQ(t->JDF_GetNumberOfSheets(), 6);
