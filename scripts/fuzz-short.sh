@@ -3,7 +3,8 @@
 # every fuzzer for a bounded time (FUZZ_SECONDS, default 60) from its seed corpus.
 #
 # Conventions: a fuzz target is an executable named *_fuzzer built from fuzz/<area>/; its seeds are
-# fuzz/<area>/corpus/ and its dictionary fuzz/<area>/fuzz.dict, when present. The seeds are copied
+# fuzz/<area>/corpus/ (plus the shared corpus files fuzz/<area>/seeds-from-shared names) and its
+# dictionary fuzz/<area>/fuzz.dict, when present. The seeds are copied
 # to a scratch corpus, so new inputs never land in the repository. A crash leaves its input in
 # build/fuzz/artifacts/ and fails the script.
 #
@@ -45,6 +46,16 @@ for target in $targets; do
   area=$(basename "$(dirname "$binary")")
   scratch=$(mktemp -d)
   if [ -d "fuzz/$area/corpus" ]; then cp -r "fuzz/$area/corpus/." "$scratch/"; fi
+  # Seeds from the third-party corpus (never committed): fuzz/<area>/seeds-from-shared lists globs
+  # under ../shared/corpus (or $VORLAN_SHARED_DIR/corpus).
+  shared="${VORLAN_SHARED_DIR:-../shared}/corpus"
+  if [ -f "fuzz/$area/seeds-from-shared" ] && [ -d "$shared" ]; then
+    while read -r pattern; do
+      [ -n "$pattern" ] || continue
+      # shellcheck disable=SC2086
+      cp $shared/$pattern "$scratch/" 2>/dev/null || true
+    done <"fuzz/$area/seeds-from-shared"
+  fi
   options=(-max_total_time="$seconds" -timeout=10 -rss_limit_mb=2048 -max_len=65536
            -print_final_stats=1 -artifact_prefix="$build/artifacts/$target-")
   if [ -f "fuzz/$area/fuzz.dict" ]; then options+=(-dict="fuzz/$area/fuzz.dict"); fi
