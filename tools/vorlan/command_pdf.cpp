@@ -7,6 +7,8 @@
 #include "pdf/separation_layers.h"
 #include "pdf/separation_rewrite.h"
 
+using vorlan::pdf::PdfFailure;
+
 namespace vorlan::cli {
 namespace {
 
@@ -28,12 +30,27 @@ std::vector<const char*> pointers(const std::vector<std::string>& names) {
     return out;
 }
 
-int finish(int result, bool json, const char* operation, const std::string& output) {
-    if (json)
-        std::printf("{\"result\": %d, \"operation\": %s, \"output\": %s, \"written\": %s}\n", result,
-                    jsonString(operation).c_str(), jsonString(output).c_str(), result == 0 ? "true" : "false");
-    else
-        std::printf("%s: %s (%s)\n", operation, result == 0 ? "written" : "failed", output.c_str());
+// The summary; a refusal carries its reason (the library has already written its line to
+// standard error).
+int finish(int result, bool json, const char* operation, const std::string& output, PdfFailure failure,
+           const std::string& input) {
+    const bool refused = result != 0 && failure != PdfFailure::None;
+    if (!json) {
+        std::printf("%s: %s (%s)%s%s\n", operation, result == 0 ? "written" : "failed", output.c_str(),
+                    refused ? ": " : "", refused ? vorlan::pdf::failureName(failure) : "");
+        return result;
+    }
+    Report r(json);
+    r.beginObject();
+    r.field("result", static_cast<long long>(result));
+    r.field("operation", std::string(operation));
+    r.field("output", output);
+    r.flag("written", result == 0);
+    if (refused) {
+        r.field("reason", std::string(vorlan::pdf::failureName(failure)));
+        r.field("message", vorlan::pdf::failureMessage(failure, failure == PdfFailure::CannotWrite ? output : input));
+    }
+    r.end();
     return result;
 }
 
@@ -54,9 +71,10 @@ int runConvertPdf(Args args) {
         return wantsHelp(args) ? 0 : 2;
     }
     std::vector<const char*> s = pointers(seps), l = pointers(layers);
+    PdfFailure failure = PdfFailure::None;
     const int result = vorlan::pdf::convertPDF(nullptr, args[0].c_str(), args[1].c_str(), s.data(), l.data(),
-                                               static_cast<int>(s.size()), static_cast<int>(l.size()));
-    return finish(result, json, "convert-pdf", args[1]);
+                                               static_cast<int>(s.size()), static_cast<int>(l.size()), &failure);
+    return finish(result, json, "convert-pdf", args[1], failure, args[0]);
 }
 
 int runRewriteSeps(Args args) {
@@ -74,8 +92,10 @@ int runRewriteSeps(Args args) {
         return wantsHelp(args) ? 0 : 2;
     }
     const std::vector<std::string> list = splitList(keepListed ? keep : drop);
-    const int result = vorlan::pdf::rewriteSeparations(nullptr, args[0].c_str(), args[1].c_str(), list, keepListed);
-    return finish(result, json, "rewrite-seps", args[1]);
+    PdfFailure failure = PdfFailure::None;
+    const int result =
+        vorlan::pdf::rewriteSeparations(nullptr, args[0].c_str(), args[1].c_str(), list, keepListed, &failure);
+    return finish(result, json, "rewrite-seps", args[1], failure, args[0]);
 }
 
 }  // namespace vorlan::cli
