@@ -2,8 +2,6 @@
 // converted and rewritten with their encryption kept; every refusal says why, once.
 #include <gtest/gtest.h>
 
-#include <qpdf/QPDF.hh>
-
 #include "pdf/pdf_failure.h"
 #include "pdf/separation_layers.h"
 #include "pdf/separation_rewrite.h"
@@ -32,21 +30,7 @@ bool encrypt(const std::string& in, const std::string& out, const std::string& u
                                     " --modify=none -- '" + in + "' '" + out + "' >/dev/null 2>&1") == 0;
 }
 
-// Revision and permissions of the file's encryption; R 0 when it is not encrypted.
-std::pair<int, int> encryption(const std::string& path) {
-    QPDF pdf;
-    pdf.processFile(path.c_str());
-    int r = 0, p = 0;
-    if (!pdf.isEncrypted(r, p)) r = 0;
-    return {r, p};
-}
-
-std::map<std::string, long> inkedPlates(const std::string& pdf) {
-    std::map<std::string, long> out;
-    for (auto& [name, pixels] : vorlan::test::platePixels(pdf, 1))
-        if (pixels > 0) out[name] = pixels;
-    return out;
-}
+std::map<std::string, long> inkedPlates(const std::string& pdf) { return vorlan::test::inkedPlates(pdf, 1); }
 
 }  // namespace
 
@@ -58,7 +42,7 @@ TEST(RestrictedPdf, OpensWithTheEmptyPasswordAndKeepsItsEncryption) {
         const std::string plain = (dir / "plain.pdf").string(), input = (dir / "in.pdf").string();
         writeSpotPdf(plain);
         ASSERT_TRUE(encrypt(plain, input, "", bits));
-        const std::pair<int, int> original = encryption(input);
+        const std::pair<int, int> original = vorlan::test::encryptionOf(input);
         ASSERT_EQ(original.first, bits == "128" ? 3 : 6);
         const std::string before = vorlan::test::readFile(input);
         ASSERT_GT(vorlan::test::renderPage(input, 1).inked(), 0) << "the input renders";
@@ -82,7 +66,7 @@ TEST(RestrictedPdf, OpensWithTheEmptyPasswordAndKeepsItsEncryption) {
                   (std::vector<int>{0, 0}));
 
         for (const std::string& out : {converted, single, drop, keep}) {
-            EXPECT_EQ(encryption(out), original) << out;
+            EXPECT_EQ(vorlan::test::encryptionOf(out), original) << out;
             std::string check;
             EXPECT_TRUE(vorlan::test::qpdfCheckPasses(out, &check)) << out << check;
         }
