@@ -66,7 +66,8 @@ int runConvertPdf(Args args) {
                    "content group of that name, and all other content not already under optional content in\n"
                    "the group \"KVVersionSpecialOCGName\"; the new groups start OFF. --layers names the PDF's\n"
                    "own layers; without it, content already in layers is grouped as well and the layer order\n"
-                   "lists only the new groups. Exit status 0 when OUT was written, else 1.\n",
+                   "lists only the new groups. Exit status 0 when OUT was written, else 1, and the reason\n"
+                   "(also in --json) on standard error.\n",
                    wantsHelp(args) ? stdout : stderr);
         return wantsHelp(args) ? 0 : 2;
     }
@@ -87,7 +88,8 @@ int runRewriteSeps(Args args) {
                    "Writes OUT: IN with separations replaced by the colorant None. --drop: the listed\n"
                    "separations print nothing, everything else stays. --keep: only the listed separations\n"
                    "print; other separations, process colours and process-colour images are taken out.\n"
-                   "Names are compared exactly. Exit status 0 when OUT was written, else 1.\n",
+                   "Names are compared exactly. Exit status 0 when OUT was written, else 1, and the reason\n"
+                   "(also in --json) on standard error.\n",
                    wantsHelp(args) ? stdout : stderr);
         return wantsHelp(args) ? 0 : 2;
     }
