@@ -12,6 +12,7 @@ const char* failureName(PdfFailure failure) {
         case PdfFailure::Damaged: return "damaged";
         case PdfFailure::DamagedBeyondRepair: return "damaged-beyond-repair";
         case PdfFailure::CannotWrite: return "cannot-write";
+        case PdfFailure::NameTooLong: return "name-too-long";
     }
     return "";
 }
@@ -24,6 +25,8 @@ std::string failureMessage(PdfFailure failure, const std::string& path) {
         case PdfFailure::Damaged: return "Unable to read " + path + ": the file is damaged";
         case PdfFailure::DamagedBeyondRepair: return "Unable to read " + path + ": the file is damaged beyond repair";
         case PdfFailure::CannotWrite: return "Unable to write " + path + ": the output cannot be created";
+        case PdfFailure::NameTooLong:
+            return "Unable to convert " + path + ": a separation or layer name is missing or too long";
     }
     return {};
 }

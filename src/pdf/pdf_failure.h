@@ -12,10 +12,11 @@ enum class PdfFailure {
     Damaged,              // not readable as a PDF (opened without repair), or a page's content is unreadable
     DamagedBeyondRepair,  // not readable as a PDF even with repair
     CannotWrite,          // the output (or its folder) cannot be created or written
+    NameTooLong,          // a separation or layer name to convert is missing or too long
 };
 
 // A short stable token for machine-readable output ("cannot-open", "password-protected",
-// "damaged", "damaged-beyond-repair", "cannot-write"); empty for None.
+// "damaged", "damaged-beyond-repair", "cannot-write", "name-too-long"); empty for None.
 const char* failureName(PdfFailure failure);
 
 // The operator's line for a failure concerning `path`, without the line end, e.g.

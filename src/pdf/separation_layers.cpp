@@ -265,11 +265,13 @@ int convertPDF(ZippedJDFFileSystem* fs, const char* input, const char* output, c
     if (!output || !*output) return refuse(PdfFailure::CannotWrite, output ? output : "", why);
     std::vector<ConversionEntry> entries;
     for (int i = 0; i < separationCount; ++i) {
-        if (!separations[i] || std::string(separations[i]).size() >= kMaxConversionName) return 1;
+        if (!separations[i] || std::string(separations[i]).size() >= kMaxConversionName)
+            return refuse(PdfFailure::NameTooLong, input, why);
         entries.push_back({separations[i], separations[i], true});
     }
     for (int i = 0; i < layerCount; ++i) {
-        if (!layers[i] || std::string(layers[i]).size() >= kMaxConversionName) return 1;
+        if (!layers[i] || std::string(layers[i]).size() >= kMaxConversionName)
+            return refuse(PdfFailure::NameTooLong, input, why);
         entries.push_back({std::string(), layers[i], false});
     }
     const std::filesystem::path target = prepareOutputPath(output);

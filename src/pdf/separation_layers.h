@@ -45,8 +45,8 @@ bool convertSeparationsToLayers(const char* input, const ConversionEntry* entrie
 // Converts `input` into `output` with separations and plain layers. 0 when the converted file
 // was written, 1 otherwise: a null or empty path, a name of kMaxConversionName bytes or more, an
 // output path whose folder or file cannot be created, an input that cannot be opened, a failed
-// save. Every refusal but the name length writes one line naming the file and the reason to
-// standard error (reportFailure) and sets *why when given. Starts the PDF session through the
+// save. Every refusal writes one line naming the file and the reason to standard error
+// (reportFailure) and sets *why when given. Starts the PDF session through the
 // file context's flag (the context may be null).
 int convertPDF(ZippedJDFFileSystem* fs, const char* input, const char* output, const char* const* separations,
                const char* const* layers, int separationCount, int layerCount, PdfFailure* why = nullptr);

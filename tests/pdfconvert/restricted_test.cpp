@@ -125,4 +125,12 @@ TEST(RefusedPdf, EachRefusalWritesOneLineNamingTheFileAndTheReason) {
         EXPECT_FALSE(std::filesystem::exists(out));
     }
     EXPECT_NE(failureMessage(PdfFailure::PasswordProtected, locked).find("password-protected"), std::string::npos);
+
+    const std::string longName(kMaxConversionName, 'x');
+    const char* tooLong[] = {longName.c_str()};
+    PdfFailure why = PdfFailure::None;
+    testing::internal::CaptureStderr();
+    EXPECT_EQ(convertPDF(nullptr, good.c_str(), out.c_str(), tooLong, nullptr, 1, 0, &why), 1);
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), failureMessage(PdfFailure::NameTooLong, good) + "\n");
+    EXPECT_EQ(why, PdfFailure::NameTooLong);
 }
