@@ -30,6 +30,13 @@ bool contains(QPDFObjectHandle array, QPDFObjectHandle item) {
     return false;
 }
 
+// Drops the null entries of an array (direct nulls and references to objects that no longer
+// exist): they name no group, and some readers stop reading a group list at the first one.
+void dropNulls(QPDFObjectHandle array) {
+    for (int i = array.getArrayNItems() - 1; i >= 0; --i)
+        if (array.getArrayItem(i).isNull()) array.eraseItem(i);
+}
+
 void removeFrom(QPDFObjectHandle array, QPDFObjectHandle item) {
     if (!array.isArray()) return;
     for (int i = array.getArrayNItems() - 1; i >= 0; --i)
@@ -75,6 +82,7 @@ QPDFObjectHandle findOrCreateOCG(QPDF& pdf, const std::string& name) {
         QPDFObjectHandle ocgs = properties.getKey("/OCGs");
         const bool hadGroups = ocgs.isArray();
         if (!hadGroups) ocgs = ensureArray(properties, "/OCGs");
+        dropNulls(ocgs);
         QPDFObjectHandle config = ensureDictionary(properties, "/D");
         QPDFObjectHandle order = config.getKey("/Order");
         if (!order.isArray()) {  // unlisted groups would drop out of viewers' lists: list them first
@@ -83,6 +91,7 @@ QPDFObjectHandle findOrCreateOCG(QPDF& pdf, const std::string& name) {
                 for (QPDFObjectHandle existing : ocgs.aitems()) order.appendItem(existing);
             config.replaceKey("/Order", order);
         }
+        dropNulls(order);
         if (ocg.isNull()) {
             ocg = pdf.makeIndirectObject(QPDFObjectHandle::parse("<< /Type /OCG >>"));
             ocg.replaceKey("/Name", QPDFObjectHandle::newUnicodeString(name));

@@ -20,7 +20,8 @@ std::string ocgName(QPDFObjectHandle ocg);
 // that name. Either way it gets /Intent [/View /Print], is set OFF in the default configuration
 // and is listed at the end of its /Order (once: a group already listed at the top level of /Order
 // stays where it is). A missing /OCProperties, /D or /Order is created; a new /Order lists the
-// document's existing groups first. Null handle on failure; never throws.
+// document's existing groups first. Null entries of /OCGs and of the top level of /Order (such as
+// references to objects that no longer exist) are dropped. Null handle on failure; never throws.
 QPDFObjectHandle findOrCreateOCG(QPDF& pdf, const std::string& name);
 
 // Empties the /Order array of the default configuration when there is one.

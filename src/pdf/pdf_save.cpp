@@ -133,7 +133,9 @@ bool saveDocument(QPDF& pdf, const std::filesystem::path& path, bool linearise) 
             protectedNames = true;
             QPDFWriter writer(pdf, path.c_str(), file, false);
             writer.setLinearization(linearise);
-            writer.setDeterministicID(true);
+            // The writer keeps an encrypted input's encryption. Its key is derived from the
+            // file ID, which must then be known before the content it would be computed from.
+            writer.setDeterministicID(!pdf.isEncrypted());
             writer.write();
             written = true;
         } catch (const std::exception&) {

@@ -23,10 +23,12 @@ std::filesystem::path prepareOutputPath(const std::string& path);
 void protectNumberSignsInNames(QPDF& pdf);
 void restoreNumberSignsInNames(QPDF& pdf);
 
-// Full save with linearisation (unless told otherwise) and a deterministic file ID, through a
-// temporary file beside the target that is renamed over it, so the target is either the complete
-// new file or untouched (saving over the open input is therefore safe). Names are protected for
-// the write and restored afterwards. False on any failure. Never throws.
+// Full save with linearisation (unless told otherwise) through a temporary file beside the target
+// that is renamed over it, so the target is either the complete new file or untouched (saving
+// over the open input is therefore safe). An encrypted document is written with its own
+// encryption (algorithm, permissions, passwords); the file ID is deterministic for documents
+// without encryption only (with encryption its second part is new on every save). Names are
+// protected for the write and restored afterwards. False on any failure. Never throws.
 //
 // qpdf works out a document's linearisation once: a document changed after a linearised save
 // must not be saved linearised again (write it without, and linearise a fresh opening of that).

@@ -241,36 +241,48 @@ bool convertDocumentSeparations(QPDF& pdf, const std::vector<ConversionEntry>& e
 }
 
 bool convertSeparationsToLayers(const char* input, const ConversionEntry* entries, int count, const char* output,
-                                bool* saved) {
+                                bool* saved, PdfFailure* why) {
     if (saved) *saved = false;
-    std::unique_ptr<QPDF> pdf = openDocument(input, true);
-    if (!pdf || !output || !*output) return false;
+    std::unique_ptr<QPDF> pdf = openDocument(input, true, why);
+    if (!pdf) return false;
+    if (!output || !*output) {
+        if (why) *why = PdfFailure::CannotWrite;
+        return false;
+    }
     std::vector<ConversionEntry> list(entries, entries + (count > 0 ? count : 0));
     const bool converted = convertDocumentSeparations(*pdf, list);
     const bool written = saveDocument(*pdf, output);
     if (saved) *saved = written;
+    if (!written && why) *why = PdfFailure::CannotWrite;
     return converted && written;
 }
 
 int convertPDF(ZippedJDFFileSystem* fs, const char* input, const char* output, const char* const* separations,
-               const char* const* layers, int separationCount, int layerCount) {
+               const char* const* layers, int separationCount, int layerCount, PdfFailure* why) {
+    if (why) *why = PdfFailure::None;
     if (fs) ensurePdfLibraryStarted(fs);
-    if (!input || !*input || !output || !*output) return 1;
+    if (!input || !*input) return refuse(PdfFailure::CannotOpen, input ? input : "", why);
+    if (!output || !*output) return refuse(PdfFailure::CannotWrite, output ? output : "", why);
     std::vector<ConversionEntry> entries;
     for (int i = 0; i < separationCount; ++i) {
-        if (!separations[i] || std::string(separations[i]).size() >= kMaxConversionName) return 1;
+        if (!separations[i] || std::string(separations[i]).size() >= kMaxConversionName)
+            return refuse(PdfFailure::NameTooLong, input, why);
         entries.push_back({separations[i], separations[i], true});
     }
     for (int i = 0; i < layerCount; ++i) {
-        if (!layers[i] || std::string(layers[i]).size() >= kMaxConversionName) return 1;
+        if (!layers[i] || std::string(layers[i]).size() >= kMaxConversionName)
+            return refuse(PdfFailure::NameTooLong, input, why);
         entries.push_back({std::string(), layers[i], false});
     }
     const std::filesystem::path target = prepareOutputPath(output);
-    if (target.empty()) return 1;
+    if (target.empty()) return refuse(PdfFailure::CannotWrite, output, why);
     // Judged by the file: a conversion that failed part way is still saved and counts.
     bool saved = false;
-    convertSeparationsToLayers(input, entries.data(), static_cast<int>(entries.size()), target.c_str(), &saved);
-    return saved ? 0 : 1;
+    PdfFailure failure = PdfFailure::None;
+    convertSeparationsToLayers(input, entries.data(), static_cast<int>(entries.size()), target.c_str(), &saved,
+                               &failure);
+    if (saved) return 0;
+    return refuse(failure, failure == PdfFailure::CannotWrite ? output : input, why);
 }
 
 }  // namespace vorlan::pdf

@@ -8,6 +8,8 @@
 #include <string>
 #include <vector>
 
+#include "pdf/pdf_failure.h"
+
 struct ZippedJDFFileSystem;
 
 namespace vorlan::pdf {
@@ -31,18 +33,22 @@ struct ConversionEntry {
 // they were read. Never throws.
 bool convertDocumentSeparations(QPDF& pdf, const std::vector<ConversionEntry>& entries);
 
-// Opens `input` (repairing a damaged cross-reference table), converts it and saves it
-// (linearised) to `output`. False when the input cannot be opened, the conversion reported a
-// failure or the save failed; a document that opened is saved even when its conversion failed
-// part way, and *saved (when given) tells whether the file was written.
+// Opens `input` (repairing a damaged cross-reference table; an encrypted file opens with the
+// empty user password), converts it and saves it (linearised, with the input's encryption) to
+// `output`. False when the input cannot be opened, the conversion reported a failure or the save
+// failed; a document that opened is saved even when its conversion failed part way, and *saved
+// (when given) tells whether the file was written. *why (when given) says why the input could
+// not be opened (PdfFailure of openDocument) or the output not written (CannotWrite).
 bool convertSeparationsToLayers(const char* input, const ConversionEntry* entries, int count, const char* output,
-                                bool* saved = nullptr);
+                                bool* saved = nullptr, PdfFailure* why = nullptr);
 
 // Converts `input` into `output` with separations and plain layers. 0 when the converted file
 // was written, 1 otherwise: a null or empty path, a name of kMaxConversionName bytes or more, an
 // output path whose folder or file cannot be created, an input that cannot be opened, a failed
-// save. Starts the PDF session through the file context's flag (the context may be null).
+// save. Every refusal writes one line naming the file and the reason to standard error
+// (reportFailure) and sets *why when given. Starts the PDF session through the
+// file context's flag (the context may be null).
 int convertPDF(ZippedJDFFileSystem* fs, const char* input, const char* output, const char* const* separations,
-               const char* const* layers, int separationCount, int layerCount);
+               const char* const* layers, int separationCount, int layerCount, PdfFailure* why = nullptr);
 
 }  // namespace vorlan::pdf

@@ -449,24 +449,39 @@ bool rewriteDocumentSeparations(QPDF& pdf, const std::vector<std::string>& separ
 }
 
 int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output,
-                       const std::vector<std::string>& separations, bool keepListed) {
+                       const std::vector<std::string>& separations, bool keepListed, PdfFailure* why) {
+    if (why) *why = PdfFailure::None;
     if (fs) ensurePdfLibraryStarted(fs);
-    if (!input || !*input || !output || !*output) return 1;
-    const std::filesystem::path target = prepareOutputPath(output);
-    if (target.empty()) return 1;
-    std::unique_ptr<QPDF> pdf = openDocument(input, false);
-    if (!pdf) return 1;
-    const bool rewritten = rewriteDocumentSeparations(*pdf, separations, keepListed);
-    return rewritten && saveDocument(*pdf, target) ? 0 : 1;
+    if (!input || !*input) return refuse(PdfFailure::CannotOpen, input ? input : "", why);
+    const std::filesystem::path target = output ? prepareOutputPath(output) : std::filesystem::path();
+    if (target.empty()) return refuse(PdfFailure::CannotWrite, output ? output : "", why);
+    PdfFailure failure = PdfFailure::None;
+    std::unique_ptr<QPDF> pdf = openDocument(input, false, &failure);
+    if (!pdf) return refuse(failure, input, why);
+    if (!rewriteDocumentSeparations(*pdf, separations, keepListed)) return refuse(PdfFailure::Damaged, input, why);
+    return saveDocument(*pdf, target) ? 0 : refuse(PdfFailure::CannotWrite, output, why);
 }
 
 std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* input,
                                            const std::vector<SeparationVariant>& variants) {
     if (fs) ensurePdfLibraryStarted(fs);
     std::vector<int> results(variants.size(), 1);
-    if (!input || !*input) return results;
-    std::unique_ptr<QPDF> pdf = openDocument(input, false);
-    if (!pdf) return results;
+    if (variants.empty()) return results;
+    // Variants refused for the same reason share one line.
+    std::set<std::string> reported;
+    auto refuseVariant = [&](PdfFailure failure, const std::string& path) {
+        if (reported.insert(failureMessage(failure, path)).second) reportFailure(failure, path);
+    };
+    if (!input || !*input) {
+        refuseVariant(PdfFailure::CannotOpen, input ? input : "");
+        return results;
+    }
+    PdfFailure failure = PdfFailure::None;
+    std::unique_ptr<QPDF> pdf = openDocument(input, false, &failure);
+    if (!pdf) {
+        refuseVariant(failure, input);
+        return results;
+    }
     // Every page is read and parsed once; each variant's rewriter records its changes, which are
     // made for its save alone and taken back afterwards.
     struct Target {
@@ -478,7 +493,10 @@ std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* 
     std::vector<Target> targets;
     for (size_t i = 0; i < variants.size(); ++i) {
         std::filesystem::path path = prepareOutputPath(variants[i].output);
-        if (path.empty()) continue;
+        if (path.empty()) {
+            refuseVariant(PdfFailure::CannotWrite, variants[i].output);
+            continue;
+        }
         targets.push_back({i, std::move(path),
                            std::make_unique<SeparationRewriter>(*pdf, variants[i].separations,
                                                                 variants[i].keepListed, true)});
@@ -501,13 +519,19 @@ std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* 
             }
         }
     }
-    for (Target& t : targets) {
+    size_t next = 0;
+    for (; next < targets.size(); ++next) {
+        Target& t = targets[next];
         DocumentEdits& changes = t.rewriter->changes();
         try {
             t.rewriter->finish();
-            if (t.ok) {
+            if (!t.ok) {
+                refuseVariant(PdfFailure::Damaged, input);
+            } else {
                 // The shared document is written as it is (qpdf cannot linearise one document
-                // twice) and that file, opened afresh, is saved linearised.
+                // twice) and that file, opened afresh, is saved linearised. An encrypted input
+                // gives an encrypted plain file, which opens with the same empty user password,
+                // so the variant keeps the input's encryption.
                 std::filesystem::path plain = t.path;
                 plain += ".vorlan-plain-" + std::to_string(::getpid()) + ".tmp";
                 changes.apply();
@@ -515,6 +539,7 @@ std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* 
                 changes.undo();
                 std::unique_ptr<QPDF> copy = written ? openDocument(plain.c_str(), false) : nullptr;
                 if (copy && saveDocument(*copy, t.path)) results[t.index] = 0;
+                else refuseVariant(PdfFailure::CannotWrite, variants[t.index].output);
                 copy.reset();
                 std::error_code ec;
                 std::filesystem::remove(plain, ec);
@@ -527,6 +552,7 @@ std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* 
         }
         t.rewriter.reset();
     }
+    for (; next < targets.size(); ++next) refuseVariant(PdfFailure::CannotWrite, variants[targets[next].index].output);
     return results;
 }
 

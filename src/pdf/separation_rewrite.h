@@ -13,6 +13,8 @@
 #include <string>
 #include <vector>
 
+#include "pdf/pdf_failure.h"
+
 class QPDF;
 struct ZippedJDFFileSystem;
 
@@ -24,11 +26,15 @@ namespace vorlan::pdf {
 // still rewritten as far as they were read). Never throws.
 bool rewriteDocumentSeparations(QPDF& pdf, const std::vector<std::string>& separations, bool keepListed);
 
-// Opens `input` (no repair), rewrites it and saves it linearised to `output` (created with its
-// folders; replaced only when the new file is complete). 0 when the document was rewritten and
-// saved, 1 otherwise. Starts the PDF session through the file context's flag (may be null).
+// Opens `input` (no repair; an encrypted file opens with the empty user password), rewrites it
+// and saves it linearised, with the input's encryption, to `output` (created with its folders;
+// replaced only when the new file is complete). 0 when the document was rewritten and saved, 1
+// otherwise; a refusal writes one line naming the file and the reason to standard error
+// (reportFailure) and sets *why when given: the input's PdfFailure of openDocument, Damaged when
+// a page's content cannot be read to its end, CannotWrite for the output. Starts the PDF session
+// through the file context's flag (may be null).
 int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output,
-                       const std::vector<std::string>& separations, bool keepListed);
+                       const std::vector<std::string>& separations, bool keepListed, PdfFailure* why = nullptr);
 int rewriteSeparations(ZippedJDFFileSystem* fs, const char* input, const char* output, const char* const* separations,
                        int count, bool keepListed);
 
@@ -39,9 +45,10 @@ struct SeparationVariant {
     bool keepListed = false;
 };
 
-// Writes every variant of `input`, each as rewriteSeparations would (0 written, 1 not), and
-// returns one result per variant in order. A variant that fails leaves nothing at its output
-// path (a file already there stays as it was).
+// Writes every variant of `input`, each as rewriteSeparations would (0 written, 1 not, the reason
+// reported on standard error, each distinct line once), and returns one result per variant in
+// order. A variant that fails leaves nothing at its output path (a file already there stays as
+// it was).
 std::vector<int> rewriteSeparationVariants(ZippedJDFFileSystem* fs, const char* input,
                                            const std::vector<SeparationVariant>& variants);
 

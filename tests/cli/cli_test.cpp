@@ -114,3 +114,35 @@ TEST(Cli, BundledExampleJobsGiveVersionedTickets) {
               0)
         << output;
 }
+
+TEST(Cli, AJobWhosePdfForbidsChangesIsConvertedWithItsEncryptionKept) {
+    if (!vorlan::test::haveProgram("python3") || !vorlan::test::haveProgram("qpdf")) GTEST_SKIP() << "python3 or qpdf missing";
+    TempDir dir;
+    const std::string example = (dir / "example").string(), pdf = example + "/job1D0001/brochure.pdf";
+    ASSERT_EQ(runCommand(std::string("python3 ") + VORLAN_SOURCE_DIR + "/examples/generate_example.py " + example), 0);
+    ASSERT_EQ(runCommand("qpdf --encrypt '' owner 256 --modify=none -- --replace-input " + pdf), 0);
+    const std::string env = "VORLAN_JOB_STORE=" + (dir / "store").string() + " ";
+    std::string output;
+    EXPECT_EQ(runCommand(env + cli() + " consume --impinfo " + example + "/job1.impinfo --job-folder " + example +
+                             " --out-dir " + example + "/out " + example + "/job1.0001 " + example + "/versioned.jdf",
+                         &output),
+              0)
+        << output;
+    // Exit status 3: encrypted, and no password needed to open it.
+    EXPECT_EQ(runCommand("qpdf --requires-password " + example + "/out/vorlan-output-1.pdf"), 3);
+}
+
+TEST(Cli, PdfCommandsSayWhyTheyRefuse) {
+    TempDir dir;
+    const std::string plain = (dir / "plain.pdf").string(), locked = (dir / "locked.pdf").string();
+    writeFile(plain, vorlan::test::minimalPdf());
+    ASSERT_EQ(runCommand("qpdf --encrypt secret owner 256 -- " + plain + " " + locked), 0);
+    const std::string line = "Unable to open " + locked + ": the file is password-protected\n";
+    for (const std::string command : {"convert-pdf --seps Gold", "rewrite-seps --drop Gold"}) {
+        std::string output;
+        EXPECT_EQ(run(command + " --json " + locked + " " + (dir / "out.pdf").string(), &output), 1);
+        EXPECT_NE(output.find(line), std::string::npos) << output;  // standard error
+        EXPECT_NE(output.find("\"reason\": \"password-protected\""), std::string::npos) << output;
+        EXPECT_NE(output.find("\"message\": \"" + line.substr(0, line.size() - 1) + "\""), std::string::npos) << output;
+    }
+}

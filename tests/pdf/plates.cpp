@@ -68,4 +68,17 @@ std::map<std::string, long> platePixels(const std::string& pdf, int page, int dp
     return plates;
 }
 
+std::map<std::string, long> inkedPlates(const std::map<std::string, long>& plates) {
+    std::map<std::string, long> out;
+    for (auto& [name, pixels] : plates)
+        if (pixels > 0) out[name] = pixels;
+    return out;
+}
+
+std::map<std::string, long> inkedPlates(const std::string& pdf, int page) {
+    const std::map<std::string, long> plates = platePixels(pdf, page);
+    EXPECT_FALSE(plates.empty()) << "gs could not render page " << page << " of " << pdf;
+    return inkedPlates(plates);
+}
+
 }  // namespace vorlan::test

@@ -237,3 +237,27 @@ TEST(SeparationLayers, AnnotationsJoinTheCatchAllGroup) {
     ASSERT_TRUE(vorlan::test::showOnlyGroups(out, shown, {kSpecialOCGName}));
     EXPECT_GT(vorlan::test::renderPage(shown, 1).inked(), 0);
 }
+
+TEST(SeparationLayers, NullEntriesOfADamagedLayerListAreDroppedSoReadersFindTheNewGroups) {
+    if (!haveRenderers()) GTEST_SKIP() << "pdftoppm or qpdf missing";
+    TempDir dir;
+    // /OCGs and /Order start with a reference to an object that does not exist (9 0 R).
+    const std::string in = (dir / "in.pdf").string();
+    vorlan::test::writeFile(in, vorlan::test::handWrittenPdf(
+        {"<< /Type /Catalog /Pages 2 0 R /OCProperties << /OCGs [9 0 R 5 0 R] /D << /Order [9 0 R 5 0 R] >> >> >>",
+         "<< /Type /Pages /Kids [3 0 R] /Count 1 >>",
+         "<< /Type /Page /Parent 2 0 R /MediaBox [0 0 40 40] /Contents 4 0 R /Resources << >> >>",
+         "<< /Length 19 >>\nstream\n0 g 5 5 30 30 re f\nendstream", "<< /Type /OCG /Name (Existing) >>"}));
+    ASSERT_GT(vorlan::test::renderPage(in, 1).inked(), 0);
+    const char* seps[] = {"Gold"};
+    const char* layers[] = {"Existing"};
+    for (int layerCount : {1, 0}) {  // the layer order kept, or emptied (separations only)
+        SCOPED_TRACE(layerCount);
+        const std::string out = (dir / "out.pdf").string();
+        ASSERT_EQ(convertPDF(nullptr, in.c_str(), out.c_str(), seps, layers, 1, layerCount), 0);
+        const vorlan::test::GreyImage image = vorlan::test::renderPage(out, 1);
+        ASSERT_FALSE(image.pixels.empty());
+        EXPECT_EQ(image.inked(), 0) << "the new groups start OFF";
+        EXPECT_EQ(vorlan::test::allGroups(out), (std::vector<std::string>{"Existing", "Gold", kSpecialOCGName}));
+    }
+}

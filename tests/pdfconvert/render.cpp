@@ -97,6 +97,19 @@ std::vector<std::string> groupOrder(const std::string& path) {
     return names;
 }
 
+std::pair<int, int> encryptionOf(const std::string& path) {
+    int r = 0, p = 0;
+    try {
+        QPDF pdf;
+        pdf.setSuppressWarnings(true);
+        pdf.processFile(path.c_str());
+        if (!pdf.isEncrypted(r, p)) r = p = 0;
+    } catch (const std::exception&) {
+        r = p = 0;
+    }
+    return {r, p};
+}
+
 bool qpdfCheckPasses(const std::string& pdf, std::string* output) {
     return runCommand("qpdf --check '" + pdf + "' 2>&1", output) == 0;
 }

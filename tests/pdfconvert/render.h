@@ -3,6 +3,7 @@
 #pragma once
 
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace vorlan::test {
@@ -27,6 +28,10 @@ std::vector<std::string> allGroups(const std::string& pdf);
 
 // The names of the groups listed at the top level of the default configuration's /Order.
 std::vector<std::string> groupOrder(const std::string& pdf);
+
+// Revision and permissions (R, P) of a file's encryption; {0, 0} when it is not encrypted or
+// cannot be opened.
+std::pair<int, int> encryptionOf(const std::string& pdf);
 
 // `qpdf --check` exit status 0 (warnings count as failure).
 bool qpdfCheckPasses(const std::string& pdf, std::string* output = nullptr);
