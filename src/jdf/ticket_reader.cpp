@@ -4,6 +4,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <memory>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -160,6 +161,15 @@ bool vorlan::jdf::hasLinkWithUsage(const JDF::JDFResource& resource, const char*
 
 namespace {
 
+// After the node's own pool children: the resources it links from its ancestors' pools (MIS
+// and imposition tools keep them in the root's pool), in link order, each once.
+void appendLinkedResources(const JDF::JDFNode& node, JDF::vElement& resources) {
+    std::set<pugi::xml_node> walked;
+    for (const JDF::KElement& r : resources) walked.insert(r.node());
+    for (const JDF::KElement& r : node.GetLinkedResources())
+        if (walked.insert(r.node()).second) resources.push_back(r);
+}
+
 bool isImposition(const JDF::JDFNode& node) {
     return vorlan::os::equalsIgnoreCase(node.GetType().c_str(), L"Imposition") ||
            node.GetTypes().contains(L"Imposition");
@@ -298,7 +308,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
                                        &t.digitalPrintingParamsElement})
             if (e->isNull()) lastError = LD_JDF_RESOURCE_MISSING;
 
-        // The resources to walk: the process node's pool, or the one run list.
+        // The resources to walk: the process node's pool and what it links, or the one run list.
         JDF::vElement resources;
         if (t.processNode.isNull()) {
             t.runListElement = firstBelow(t.rootNode, L"RunList");
@@ -307,6 +317,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
         } else {
             t.runListElement = firstBelow(t.processNode, L"RunList");
             resources = t.processNode.GetResourcePool().GetPoolChildren(L"*", JDF::JDFAttributeMap(), L"*");
+            appendLinkedResources(t.processNode, resources);
         }
         if (resources.empty()) lastError = LD_JDF_RESOURCE_MISSING;
 

@@ -4,6 +4,7 @@
 //   KElement (kelement.h)        any element; null handle = isNull(); keeps its document alive
 //   JDFElement, JDFNode          JDF elements, process nodes (jdf_element.h, jdf_node.h)
 //   JDFResource, JDFResourceLink, JDFResourcePool, JDFResourceLinkPool, JDFPart (jdf_resource.h)
+//   JDFResourceScope: the pools a node resolves its links in (resource_scope.h)
 //   JDFRunList, JDFLayoutElement, JDFFileSpec, JDFMetadataMap (run_list.h)
 //   JDFLayout, JDFSignature, JDFSheet, JDFSurface, JDFContentObject, JDFMarkObject, … (layout.h)
 //   JDFMedia (media.h); JDFRenderingParams, JDFInterpretingParams, … (params.h)
@@ -43,5 +44,6 @@
 #include "platform/jdf/params.h"
 #include "platform/jdf/parser.h"
 #include "platform/jdf/platform_utils.h"
+#include "platform/jdf/resource_scope.h"
 #include "platform/jdf/run_list.h"
 #include "platform/jdf/wstring.h"

@@ -7,6 +7,7 @@
 #include "platform/jdf/enum_tables.h"
 #include "platform/jdf/exception.h"
 #include "platform/jdf/link_table.h"
+#include "platform/jdf/resource_scope.h"
 
 namespace JDF {
 namespace {
@@ -143,9 +144,11 @@ JDFResource JDFNode::AppendMatchingResource(const WString& name, int pu, const J
 
 JDFResource JDFNode::GetMatchingResource(const WString& name, int pu, const JDFAttributeMap& partMap, int pos) const {
     std::vector<JDFResourceLink> links = matchingLinks(*this, name, pu);
+    if (links.empty()) return {};
+    JDFResourceScope scope(*this);
     int seen = 0;
     for (const JDFResourceLink& l : links) {
-        JDFResource r = l.GetTarget();
+        JDFResource r = l.GetTarget(scope);
         if (r.isNull()) continue;
         if (!partMap.empty()) r = r.GetPartition(partMap);
         if (r.isNull()) continue;
@@ -158,6 +161,20 @@ JDFResourceLink JDFNode::GetMatchingLink(const WString& name, int pu, int pos) c
     std::vector<JDFResourceLink> links = matchingLinks(*this, name, pu);
     if (pos < 0 || pos >= static_cast<int>(links.size())) return {};
     return links[static_cast<size_t>(pos)];
+}
+
+vElement JDFNode::GetLinkedResources() const {
+    vElement out;
+    JDFResourceLinkPool pool = GetResourceLinkPool();
+    if (pool.isNull()) return out;
+    JDFResourceScope scope(*this);
+    std::set<pugi::xml_node> taken;
+    for (pugi::xml_node link = pool.node().first_child(); link; link = link.next_sibling()) {
+        if (link.type() != pugi::node_element) continue;
+        JDFResource r = scope.Find(link.attribute("rRef").value());
+        if (!r.isNull() && taken.insert(r.node()).second) out.push_back(r);
+    }
+    return out;
 }
 
 JDFResourceLink JDFNode::GetLink(const JDFResource& r) const {

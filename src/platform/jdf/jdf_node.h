@@ -47,10 +47,15 @@ public:
     // The pos-th linked resource (partition when partMap is given) that matches name and
     // processUsage: 3 Any = inputs first then outputs; 1/2 one direction; 9/10 only when the
     // node's process types know that usage for the resource, and then only links with that
-    // ProcessUsage. Null when none.
+    // ProcessUsage. A link's rRef is resolved in the pools of this node and its ancestors,
+    // nearest first (JDFResourceScope). Null when none.
     JDFResource GetMatchingResource(const WString& name, int processUsage = 3,
                                     const JDFAttributeMap& partMap = JDFAttributeMap(), int pos = 0) const;
     JDFResourceLink GetMatchingLink(const WString& name, int processUsage = 3, int pos = 0) const;
+    // The resources this node's ResourceLinkPool links, in link order, each once: every link's
+    // rRef resolved as GetMatchingResource resolves it, to the whole resource (a Part selection
+    // is not applied). Links whose rRef names no resource in scope are left out.
+    vElement GetLinkedResources() const;
     // This node's link to r; null when none.
     JDFResourceLink GetLink(const JDFResource& r) const;
 

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "platform/jdf/enum_tables.h"
+#include "platform/jdf/resource_scope.h"
 
 namespace JDF {
 
@@ -201,13 +202,26 @@ WString JDFResourceLink::GetLinkedResourceName() const {
     return n;
 }
 
+namespace {
+
+// The partition of root that the link's single Part child names; root itself otherwise.
+JDFResource selectedPart(const JDFResourceLink& link, const JDFResource& root) {
+    if (root.isNull()) return root;
+    vElement parts = link.GetChildrenByTagName(L"Part");
+    if (parts.size() != 1) return root;
+    return root.GetPartition(parts[0].GetAttributeMap());
+}
+
+}  // namespace
+
 JDFResource JDFResourceLink::GetTarget() const {
     if (isNull() || !doc_) return {};
-    JDFResource root = KElement(doc_->FindByID(node_.attribute("rRef").value()), doc_);
-    vElement parts = GetChildrenByTagName(L"Part");
-    if (parts.size() != 1 || root.isNull()) return root;
-    JDFAttributeMap m = parts[0].GetAttributeMap();
-    return root.GetPartition(m);
+    return selectedPart(*this, KElement(doc_->FindByID(node_.attribute("rRef").value()), doc_));
+}
+
+JDFResource JDFResourceLink::GetTarget(const JDFResourceScope& scope) const {
+    if (isNull()) return {};
+    return selectedPart(*this, scope.Find(node_.attribute("rRef").value()));
 }
 
 // --- pools ------------------------------------------------------------------------------------

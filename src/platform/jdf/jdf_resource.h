@@ -13,6 +13,7 @@
 namespace JDF {
 
 class JDFResourceLink;
+class JDFResourceScope;
 
 class JDFResource : public JDFElement {
 public:
@@ -82,6 +83,8 @@ public:
     WString GetProcessUsage() const { return GetAttribute(L"ProcessUsage"); }
     // The linked resource (root, or the partition named by a single Part child); null if absent.
     JDFResource GetTarget() const;
+    // The same, with rRef resolved in the pools of the given scope only.
+    JDFResource GetTarget(const JDFResourceScope& scope) const;
     // The resource name the link refers to ("RunListLink" → "RunList").
     WString GetLinkedResourceName() const;
     JDFPart AppendPart() { return AppendElement(L"Part"); }
