@@ -94,6 +94,9 @@ public:
     wchar_t* getNativeFilePath(wchar_t* path);
     wchar_t* findFileByExtentionInDir(wchar_t* folder, wchar_t* extension);
     wchar_t* findFileByNameInDir(wchar_t* folder, wchar_t* name);
+    // The file a ticket names by url, looked for by its file name ("%20" read as a blank) in
+    // folder and its sub-folders; a new heap path (free), or null when not found.
+    wchar_t* findTicketFileInDir(wchar_t* folder, const wchar_t* url);
     void removePercentTwenty(wchar_t* text);
     static char* getCharFromWChar(const wchar_t* text);
     static wchar_t* getWCharFromChar(const char* text);

@@ -139,3 +139,16 @@ wchar_t* LD_JDF::findFileByNameInDir(wchar_t* folder, wchar_t* name) {
     }
     return nullptr;
 }
+
+wchar_t* LD_JDF::findTicketFileInDir(wchar_t* folder, const wchar_t* url) {
+    if (!folder || !url) return nullptr;
+    char* narrowUrl = getCharFromWChar(url);
+    char* name = extractFileNameFromPath(narrowUrl);
+    std::free(narrowUrl);
+    wchar_t* wideName = getWCharFromChar(name);
+    std::free(name);
+    removePercentTwenty(wideName);
+    wchar_t* found = findFileByNameInDir(folder, wideName);
+    std::free(wideName);
+    return found;
+}

@@ -88,6 +88,9 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
         ticketDataPath = dataPath;
         LDError read = JDF_InitializeAndParseJDF(jdfPath);
         if (read == LD_JDF_UNUSABLE || read == LD_FAILED) return exitWith(read);
+        // A ticket that yields neither a content run nor a placed object has nothing to print.
+        if (contentRuns.empty() && contentObjects.empty() && markObjects.empty())
+            return exitWith(LD_JDF_RESOURCE_MISSING);
         // A ticket that came without a Layout gets a ticket of its own, whatever the reader
         // injected to answer queries.
         if (!ticket->ticketHasLayout) {
@@ -143,14 +146,7 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
         if (jobHasTicket) {
             for (auto* list : {&contentPDFs, &markPDFs}) {
                 for (LD_PDF* pdf : *list) {
-                    char* url = getCharFromWChar(pdf->url);
-                    char* name = extractFileNameFromPath(url);
-                    std::free(url);
-                    wchar_t* wideName = getWCharFromChar(name);
-                    std::free(name);
-                    removePercentTwenty(wideName);
-                    wchar_t* found = findFileByNameInDir(dataPath, wideName);
-                    std::free(wideName);
+                    wchar_t* found = findTicketFileInDir(dataPath, pdf->url);
                     if (!found) return exitWith(LD_FILE_NOT_FOUND);
                     LD_SetTextBuffer(pdf->nativePath, found);
                     std::free(found);

@@ -1,8 +1,11 @@
 // Reads RunList resources into content and mark runs and the PDFs they name.
+#include <cstdio>
+#include <cstdlib>
 #include <cwctype>
 #include <memory>
 
 #include "jdf/ticket_reading.h"
+#include "pdf/page_geometry.h"
 #include "platform/os/text.h"
 
 namespace vorlan::jdf {
@@ -25,7 +28,41 @@ int PdfPositions::find(const wchar_t* url) const {
 
 void PdfPositions::add(const wchar_t* url, int position) { first_.emplace(urlKey(url), position); }
 
-std::unique_ptr<LD_Run> makeRun(const JDF::JDFRunList& element, int32_t runNumber, bool partition) {
+// The length a Pages range that counts from the end is read against when the PDF's own page
+// count is not known.
+constexpr int kUnknownPdfLength = 1000;
+
+int PdfPageCounts::of(const wchar_t* url) {
+    std::wstring key = urlKey(url);
+    auto known = counts_.find(key);
+    if (known != counts_.end()) return known->second;
+    int count = 0;
+    wchar_t* found = worker_.findTicketFileInDir(folder_.data(), url);
+    if (found) count = getPDFPageCount(worker_.zipFileSystem, vorlan::os::narrow(found).c_str());
+    std::free(found);
+    if (count <= 0)
+        std::fprintf(stderr, "\"%s\": PDF not found or unreadable; its page range is read against %d pages\n",
+                     vorlan::os::narrow(url).c_str(), kUnknownPdfLength);
+    counts_.emplace(std::move(key), count);
+    return count;
+}
+
+namespace {
+
+// The element's Pages as single page numbers; ends that count from the end of the PDF are
+// resolved against its page count when pageCounts is given.
+std::vector<int32_t> expandPages(const JDF::JDFRunList& element, PdfPageCounts* pageCounts) {
+    JDF::JDFIntegerRangeList pages = element.GetPages();
+    if (!pageCounts || !pages.CountsFromEnd()) return pages.ToVInt(kUnknownPdfLength);
+    std::wstring url = element.GetLayoutElement().GetFileSpec().GetURL();
+    int length = pageCounts->of(url.c_str());
+    return pages.ToVInt(length > 0 ? length : kUnknownPdfLength);
+}
+
+}  // namespace
+
+std::unique_ptr<LD_Run> makeRun(const JDF::JDFRunList& element, int32_t runNumber, bool partition,
+                                PdfPageCounts* pageCounts) {
     auto run = std::make_unique<LD_Run>();
     run->runNumber = runNumber;
     run->NPage = element.GetNPage();
@@ -36,7 +73,7 @@ std::unique_ptr<LD_Run> makeRun(const JDF::JDFRunList& element, int32_t runNumbe
     run->contentType = CONTENT_CONTENT;
     LD_SetTextBuffer(run->runName, element.GetRun().c_str());
     try {
-        run->pages = element.GetPages().ToVInt(1000);
+        run->pages = expandPages(element, pageCounts);
     } catch (const JDF::JDFException&) {
         run->pages.clear();  // a page list too large to expand is read as absent
     }
@@ -91,7 +128,7 @@ void readRunListResource(RunListReading& reading, const JDF::JDFResource& resour
         for (const JDF::KElement& child : resource.GetChildElementVector(L"RunList", L"*", {}, true, 0, false)) {
             JDF::JDFRunList partition(child);
             if (partition.GetStatus() == 7) {
-                std::unique_ptr<LD_Run> run = makeRun(partition, i, true);
+                std::unique_ptr<LD_Run> run = makeRun(partition, i, true, &reading.pageCounts);
                 std::unique_ptr<LD_PDF> pdf;
                 if (!run->IsBlank) pdf = makePdf(partition, status, true);
                 addRun(reading, marks, std::move(run), std::move(pdf));
@@ -104,7 +141,7 @@ void readRunListResource(RunListReading& reading, const JDF::JDFResource& resour
     LD_Status status = resource.GetStatus();
     if (status != 7) return;
     if (!runList.GetRun().empty()) {
-        addRun(reading, marks, makeRun(runList, 0, false), makePdf(runList, status, false));
+        addRun(reading, marks, makeRun(runList, 0, false, &reading.pageCounts), makePdf(runList, status, false));
         return;
     }
     // A run list without a Run value names a file but no pages: a PDF without run.

@@ -3,6 +3,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <filesystem>
 #include <memory>
 #include <set>
 #include <string>
@@ -321,7 +322,11 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
         }
         if (resources.empty()) lastError = LD_JDF_RESOURCE_MISSING;
 
-        vorlan::jdf::RunListReading runLists(*this);
+        // The ticket's PDFs lie in the job's data folder, or beside a ticket read on its own.
+        std::string ticketFolder = std::filesystem::path(vorlan::os::narrow(path)).parent_path().string();
+        std::wstring pdfFolder = ticketDataPath ? std::wstring(ticketDataPath)
+                                                : vorlan::os::widen(ticketFolder.empty() ? "." : ticketFolder.c_str());
+        vorlan::jdf::RunListReading runLists(*this, pdfFolder);
         if (!changed) runLists.linkCandidates = &survey.links;
         for (const JDF::KElement& element : resources) {
             JDF::JDFResource resource(element);

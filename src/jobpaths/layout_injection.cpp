@@ -51,13 +51,15 @@ bool LayoutInjectionProcessingJdf::parseTicket() {
 }
 
 void LayoutInjectionProcessingJdf::collectRuns() {
+    // Open-ended Pages ranges count the pages of the PDF as the pipeline finds it in the job.
+    vorlan::jdf::PdfPageCounts pageCounts(*worker_, dataPath_);
     int32_t position = 0;
     for (const JDF::KElement& resource : root_.GetResourcePool().GetPoolChildren(L"RunList")) {
         for (const JDF::KElement& element :
              resource.GetChildElementVector(L"RunList", L"", JDF::JDFAttributeMap(), true, 0, false)) {
             JDF::JDFRunList partition(element);
             auto part = std::make_unique<Part>();
-            part->run = vorlan::jdf::makeRun(partition, position, false);
+            part->run = vorlan::jdf::makeRun(partition, position, false, &pageCounts);
             part->run->contentType = contentTypeOf(partition);
 
             locateFile(*part, partition.GetFileURL());

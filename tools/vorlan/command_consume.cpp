@@ -92,17 +92,21 @@ int runConsume(Args args) {
 
     std::error_code ec;
     bool written = fs::exists(output, ec);
+    // A name handed out is not yet a file: only what the job wrote is listed.
+    std::vector<std::string> outputFiles;
+    for (const std::string& file : namer.handedOut)
+        if (fs::exists(file, ec)) outputFiles.push_back(file);
     Report r(json);
     if (json) {
         r.beginObject();
         r.field("ticket", output);
         r.flag("ticketWritten", written);
         r.beginArray("outputFiles");
-        for (const std::string& file : namer.handedOut) r.field("", file);
+        for (const std::string& file : outputFiles) r.field("", file);
         r.end();
     } else {
         std::printf("ticket: %s (%s)\n", output.c_str(), written ? "written" : "not written");
-        for (const std::string& file : namer.handedOut) std::printf("output file: %s\n", file.c_str());
+        for (const std::string& file : outputFiles) std::printf("output file: %s\n", file.c_str());
     }
     r.result(code);
     if (json) r.end();

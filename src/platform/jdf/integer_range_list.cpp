@@ -75,6 +75,12 @@ std::vector<int> JDFIntegerRangeList::ToVInt(int xDef) const {
     return out;
 }
 
+bool JDFIntegerRangeList::CountsFromEnd() const {
+    for (const JDFIntegerRange& r : ranges_)
+        if (r.GetLeft() < 0 || r.GetRight() < 0) return true;
+    return false;
+}
+
 WString JDFIntegerRangeList::GetString() const {
     WString out;
     for (size_t i = 0; i < ranges_.size(); ++i) {

@@ -42,6 +42,9 @@ public:
     std::vector<int> ToVInt(int xDef) const;
     std::vector<int> ToVInt() const { return ToVInt(def_); }
     int NumRanges() const { return static_cast<int>(ranges_.size()); }
+    // True when a range end is negative, i.e. counts from the end: the values then depend on
+    // the length given to ToVInt.
+    bool CountsFromEnd() const;
     const JDFIntegerRange& at(int i) const { return ranges_.at(static_cast<size_t>(i)); }
     bool empty() const { return ranges_.empty(); }
     // "a ~ b c" form; single-value ranges are written as one number.
