@@ -76,13 +76,7 @@ TEST(CorpusTickets, EveryTicketIsReadAsFarAsItGoes) {
     }
 }
 
-// count() of an XPath over the file, by xmllint.
-int xpathCount(const fs::path& file, const std::string& xpath) {
-    std::string out;
-    int status = vorlan::test::runCommand("xmllint --xpath 'count(" + xpath + ")' '" + file.string() + "' 2>/dev/null", &out);
-    EXPECT_EQ(status, 0) << xpath;
-    return std::atoi(out.c_str());
-}
+using vorlan::test::xpathCount;
 
 struct Expected {
     const char* file;

@@ -1,9 +1,13 @@
 // Generated layer-mode jobs (see job_builder.h).
 #include "job_builder.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <cstring>
+#include <map>
 #include <sstream>
+
+#include <pugixml.hpp>
 
 #include "test_support.h"
 #include "vorlan/LD_JDF.h"
@@ -36,6 +40,40 @@ int newPdfPath(char* buffer, int size, void* hostFolder) {
     std::snprintf(buffer, static_cast<size_t>(size), "%s/out-%d.pdf", host->folder.c_str(), host->counter++);
     return 0;
 }
+
+namespace {
+
+std::string localName(pugi::xml_node n) {
+    std::string name = n.name();
+    return name.substr(name.find(':') + 1);
+}
+
+// Pages a FileSpec's run list uses: its NPage and one more than the highest page of its Pages,
+// both inherited from enclosing run lists.
+int pagesUsed(pugi::xml_node fileSpec) {
+    int pages = 1;
+    bool ranged = false;
+    for (pugi::xml_node n = fileSpec.parent(); n; n = n.parent()) {
+        if (localName(n) != "RunList") continue;
+        pages = std::max(pages, n.attribute("NPage").as_int());
+        if (ranged || !n.attribute("Pages")) continue;
+        ranged = true;
+        std::string range = n.attribute("Pages").value();
+        std::replace(range.begin(), range.end(), '~', ' ');
+        std::istringstream values(range);
+        for (int page; values >> page;) pages = std::max(pages, page + 1);
+    }
+    return pages;
+}
+
+// The file name a URL ends in, "%20" read as a blank.
+std::string fileNameOf(std::string url) {
+    url = url.substr(url.find_last_of("/\\") + 1);
+    for (size_t at; (at = url.find("%20")) != std::string::npos;) url.replace(at, 3, " ");
+    return url;
+}
+
+}  // namespace
 
 std::string ticketXml(const TicketSpec& shape) {
     const int surfacesPerSheet = shape.twoSided ? 2 : 1;
@@ -134,6 +172,23 @@ Job writeTicketJob(const fs::path& root, const TicketSpec& shape, const std::str
     for (const std::string& pdf : shape.pdfs) vorlan::test::writeFile(job.dataFolder / pdf, vorlan::test::minimalPdf());
     if (shape.marks) vorlan::test::writeFile(job.dataFolder / "marks.pdf", vorlan::test::minimalPdf());
     if (!description.empty()) vorlan::test::writeFile(job.description, description);
+    return job;
+}
+
+Job writeJobForTicket(const fs::path& root, const fs::path& ticket) {
+    Job job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo", root / "out.jdf"};
+    vorlan::test::writeFile(job.dataFile, "data file of job 1\n");
+    fs::create_directories(job.dataFolder);
+    fs::copy_file(ticket, job.dataFolder / "ticket.jdf");
+    pugi::xml_document doc;
+    doc.load_file(ticket.c_str());
+    std::map<std::string, int> pdfs;
+    for (pugi::xpath_node spec : doc.select_nodes("//*[local-name()='FileSpec'][@URL]")) {
+        int& pages = pdfs[fileNameOf(spec.node().attribute("URL").value())];
+        pages = std::max(pages, pagesUsed(spec.node()));
+    }
+    for (const auto& [name, pages] : pdfs)
+        if (!name.empty()) vorlan::test::writeFile(job.dataFolder / name, vorlan::test::minimalPdf("0 0 m 10 10 l S", pages));
     return job;
 }
 

@@ -68,6 +68,9 @@ struct Job {
 // A ticket job: the ticket, a one-page PDF for every name in shape.pdfs (and marks.pdf), and the
 // description (none when empty).
 Job writeTicketJob(const std::filesystem::path& root, const TicketSpec& shape, const std::string& description);
+// A job for a ticket made by others (copied into the data folder): beside it, for every file
+// its run lists name, a PDF of that name with as many pages as they use (at least one).
+Job writeJobForTicket(const std::filesystem::path& root, const std::filesystem::path& ticket);
 // A bare-PDF job: X/job1.pdf is the data file.
 Job writeBarePdfJob(const std::filesystem::path& root, const std::string& description);
 

@@ -92,13 +92,32 @@ bool haveProgram(const std::string& name) {
     return runCommand("command -v " + name + " >/dev/null") == 0;
 }
 
-std::string minimalPdf(const std::string& content) {
-    return handWrittenPdf({
-        "<< /Type /Catalog /Pages 2 0 R >>",
-        "<< /Type /Pages /Kids [3 0 R] /Count 1 >>",
-        "<< /Type /Page /Parent 2 0 R /MediaBox [0 0 200 100] /Contents 4 0 R /Resources << >> >>",
-        "<< /Length " + std::to_string(content.size()) + " >>\nstream\n" + content + "\nendstream",
-    });
+std::string minimalPdf(const std::string& content, int pages) {
+    // Objects: catalog, page tree, the pages (3 …), then the content stream they share.
+    const std::string stream = std::to_string(pages + 3) + " 0 R";
+    std::string kids;
+    std::vector<std::string> objects = {"<< /Type /Catalog /Pages 2 0 R >>", ""};
+    for (int p = 0; p < pages; ++p) {
+        kids += (p ? " " : "") + std::to_string(p + 3) + " 0 R";
+        objects.push_back("<< /Type /Page /Parent 2 0 R /MediaBox [0 0 200 100] /Contents " + stream +
+                          " /Resources << >> >>");
+    }
+    objects[1] = "<< /Type /Pages /Kids [" + kids + "] /Count " + std::to_string(pages) + " >>";
+    objects.push_back("<< /Length " + std::to_string(content.size()) + " >>\nstream\n" + content + "\nendstream");
+    return handWrittenPdf(objects);
+}
+
+int xpathCount(const fs::path& file, const std::string& xpath) {
+    // Single-quoted for the shell; quotes inside end the quoting, add one, and start it again.
+    auto quoted = [](const std::string& text) {
+        std::string out = "'";
+        for (char c : text) out += c == '\'' ? std::string("'\\''") : std::string(1, c);
+        return out + "'";
+    };
+    std::string out;
+    if (runCommand("xmllint --xpath " + quoted("count(" + xpath + ")") + " " + quoted(file.string()), &out) != 0)
+        return -1;
+    return std::atoi(out.c_str());
 }
 
 std::string handWrittenPdf(const std::vector<std::string>& objects) {

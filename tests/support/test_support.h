@@ -50,8 +50,10 @@ bool haveProgram(const std::string& name);
 // Fails the calling test when the corpus schema or xmllint is missing.
 std::vector<std::string> filesFailingJdfSchema(const std::vector<std::filesystem::path>& files,
                                                std::string* report = nullptr);
-// A minimal valid one-page PDF (optionally with a content stream) as bytes.
-std::string minimalPdf(const std::string& content = "0 0 m 10 10 l S");
+// A minimal valid PDF of that many pages (each showing the content stream) as bytes.
+std::string minimalPdf(const std::string& content = "0 0 m 10 10 l S", int pages = 1);
+// count() of an XPath 1.0 expression over an XML file, by xmllint; -1 when xmllint fails.
+int xpathCount(const std::filesystem::path& file, const std::string& xpath);
 // A PDF of the given object bodies, numbered from 1 (object 1 is the catalog), with a
 // cross-reference table.
 std::string handWrittenPdf(const std::vector<std::string>& objects);
