@@ -1,6 +1,7 @@
 // The vorlan host: help texts, exit status = result code, job attributes.
 #include <gtest/gtest.h>
 
+#include "job_builder.h"
 #include "test_support.h"
 
 using vorlan::test::runCommand;
@@ -77,6 +78,21 @@ TEST(Cli, InspectShowsTheLayoutGivenToATicketWithoutOne) {
     std::string output;
     EXPECT_EQ(run("inspect " + (dir / "t.jdf").string(), &output), 0);
     EXPECT_NE(output.find("sheetCount: 3"), std::string::npos) << output;
+}
+
+TEST(Cli, ConsumeListsOnlyTheOutputFilesItWrote) {
+    TempDir dir;
+    // Without separations to convert, the PDF is named an output path but never written there.
+    layermode_test::Job job = layermode_test::writeTicketJob(
+        dir.path(), layermode_test::TicketSpec{}, layermode_test::descriptionXml({{"English", false, true}}, {}));
+    std::string output;
+    EXPECT_EQ(runCommand("VORLAN_JOB_STORE=" + (dir / "store").string() + " " + cli() + " consume --json --impinfo " +
+                             job.description.string() + " --out-dir " + (dir / "out").string() + " " +
+                             job.dataFile.string() + " " + job.output.string(),
+                         &output),
+              0)
+        << output;
+    EXPECT_NE(output.find("\"ticketWritten\": true, \"outputFiles\": []"), std::string::npos) << output;
 }
 
 TEST(Cli, BundledExampleJobsGiveVersionedTickets) {
