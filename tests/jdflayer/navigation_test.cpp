@@ -200,3 +200,32 @@ TEST(JdfNavigation, MediaGettersAndEnumerationDefaults) {
     EXPECT_EQ(m3.GetMediaType(), 0);  // tokens are case-sensitive
     EXPECT_EQ(JDFResource(m1).GetStatus(), 7);
 }
+
+// A node's links resolve in its own pool and its ancestors' pools, the nearest first; a sibling
+// node's pool is out of reach. GetLinkedResources gives each resolved resource once.
+TEST(JdfNavigation, LinksResolveInTheNearestAncestorPool) {
+    JDFParser parser;
+    ASSERT_TRUE(parser.ParseString(R"(<JDF xmlns="http://www.CIP4.org/JDFSchema_1_1" ID="root" Type="ProcessGroup">
+  <ResourcePool><RunList ID="dup" Run="far"/><Layout ID="lay"/></ResourcePool>
+  <JDF ID="group" Type="ProcessGroup">
+    <ResourcePool><RunList ID="dup" Run="near"/></ResourcePool>
+    <JDF ID="imp" Type="Imposition"><ResourceLinkPool>
+      <LayoutLink rRef="lay" Usage="Input"/>
+      <RunListLink rRef="dup" Usage="Input" ProcessUsage="Document"/>
+      <RunListLink rRef="dup" Usage="Input" ProcessUsage="Marks"/>
+      <MediaLink rRef="sib" Usage="Input"/>
+      <RunListLink rRef="gone" Usage="Input"/>
+    </ResourceLinkPool></JDF>
+  </JDF>
+  <JDF ID="sibling" Type="Interpreting"><ResourcePool><Media ID="sib"/></ResourcePool></JDF>
+</JDF>)"));
+    JDFNode root = JDFDoc(parser.GetDocument()).GetJDFRoot();
+    JDFNode imp = root.GetChildByTagName(L"JDF", L"", 0, JDFAttributeMap(L"ID", L"imp"), false);
+    vElement linked = imp.GetLinkedResources();
+    EXPECT_EQ(ids(linked), (std::vector<std::wstring>{L"lay", L"dup"}));
+    ASSERT_EQ(linked.size(), 2u);
+    EXPECT_EQ(linked[1].GetAttribute(L"Run"), L"near");
+    EXPECT_EQ(imp.GetMatchingResource(L"RunList", 10).GetAttribute(L"Run"), L"near");
+    EXPECT_TRUE(imp.GetMatchingResource(L"Media", 3).isNull());
+    EXPECT_TRUE(root.GetLinkedResources().empty());
+}
