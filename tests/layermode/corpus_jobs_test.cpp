@@ -16,14 +16,9 @@ using vorlan::test::xpathCount;
 
 namespace {
 
-class CorpusJobs : public testing::Test {
+class CorpusJobs : public vorlan::test::JobStoreTest {
 protected:
-    void SetUp() override { setenv("VORLAN_JOB_STORE", (tmp / "store").c_str(), 1); }
-    void TearDown() override { unsetenv("VORLAN_JOB_STORE"); }
-
     static fs::path ticket(const std::string& name) { return vorlan::test::corpusDir() / "jdf" / name; }
-
-    vorlan::test::TempDir tmp;
 };
 
 // Input: the Available partitions of the run lists not linked as marks (each names one page in

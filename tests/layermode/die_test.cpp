@@ -16,13 +16,12 @@ namespace {
 // White, a separation, is dropped from the switches by the layer-mode client changes.
 const std::vector<LayerSpec> kLayers = {{"Art", false, true}, {"Die", false, false}, {"White", true, true}};
 
-class DieCuts : public testing::Test {
+class DieCuts : public vorlan::test::JobStoreTest {
 protected:
     void SetUp() override {
-        setenv("VORLAN_JOB_STORE", (tmp / "store").c_str(), 1);
+        JobStoreTest::SetUp();
         setJobAttribute("KVPrintDieLine", "True");
     }
-    void TearDown() override { unsetenv("VORLAN_JOB_STORE"); }
 
     TicketView run(const Job& job, const char* pageRange = "All") {
         EXPECT_EQ(consume(job, pageRange), 0);
@@ -33,7 +32,6 @@ protected:
     }
     std::string dieInfo() { return vorlan::test::readFile(tmp / "job1.dieinfo"); }
 
-    vorlan::test::TempDir tmp;
     DieSpec die{true, "Die", "", 1};
 };
 

@@ -22,10 +22,8 @@ VersionSpec language(const std::string& name, long long copies, std::initializer
     return v;
 }
 
-class LayerMode : public testing::Test {
+class LayerMode : public vorlan::test::JobStoreTest {
 protected:
-    void SetUp() override { setenv("VORLAN_JOB_STORE", (tmp / "store").c_str(), 1); }
-    void TearDown() override { unsetenv("VORLAN_JOB_STORE"); }
 
     // Runs the job, expects success and a schema-valid ticket, and returns the ticket.
     TicketView run(const Job& job, const char* pageRange = "All") {
@@ -36,8 +34,6 @@ protected:
         }
         return TicketView(job.output);
     }
-
-    vorlan::test::TempDir tmp;
 };
 
 }  // namespace

@@ -1,6 +1,7 @@
 // Helpers shared by the test suites.
 #pragma once
 
+#include <cstdlib>
 #include <filesystem>
 #include <string>
 #include <vector>
@@ -57,6 +58,16 @@ int xpathCount(const std::filesystem::path& file, const std::string& xpath);
 // A PDF of the given object bodies, numbered from 1 (object 1 is the catalog), with a
 // cross-reference table.
 std::string handWrittenPdf(const std::vector<std::string>& objects);
+
+// A test with a temporary folder (tmp) that holds the job attribute store the library uses
+// while the test runs (VORLAN_JOB_STORE).
+class JobStoreTest : public testing::Test {
+protected:
+    void SetUp() override { setenv("VORLAN_JOB_STORE", (tmp / "store").c_str(), 1); }
+    void TearDown() override { unsetenv("VORLAN_JOB_STORE"); }
+
+    TempDir tmp;
+};
 
 }  // namespace vorlan::test
 
