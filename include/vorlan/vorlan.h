@@ -24,7 +24,7 @@ extern "C" {
     X(LD_FAILED, 1, "general failure (description not well-formed, expansion or die-cut failure, ...)") \
     X(LD_QUERY_TARGET_ABSENT, 3, "a query named a PDF, node type or process that does not exist")       \
     X(LD_JDF_UNUSABLE, 4, "the ticket cannot be used, or its layout is automated (copied unchanged)")   \
-    X(LD_JDF_RESOURCE_MISSING, 6, "a queried process node or resource is absent")                       \
+    X(LD_JDF_RESOURCE_MISSING, 6, "a node or resource is absent, or the ticket has nothing to print")   \
     X(LD_FILE_NOT_FOUND, 8, "data file of no known kind, or a PDF of the job is missing")               \
     X(LD_REFERENCE_OUT_OF_RANGE, 9, "the description names a PDF or ordinal that does not exist")       \
     X(LD_PDF_CONVERSION_FAILED, 11, "converting a PDF for the versions failed")                         \
