@@ -61,13 +61,12 @@ std::string fileOf(const TicketView& t, int run) {
     return url.rfind("file://", 0) == 0 ? url.substr(7) : url;
 }
 
-class SeparationJobs : public testing::Test {
+class SeparationJobs : public vorlan::test::JobStoreTest {
 protected:
     void SetUp() override {
-        setenv("VORLAN_JOB_STORE", (tmp / "store").c_str(), 1);
+        JobStoreTest::SetUp();
         setJobAttribute("KVPrintDieLine", "True");
     }
-    void TearDown() override { unsetenv("VORLAN_JOB_STORE"); }
 
     // Runs the job and returns its ticket, checked against the schema.
     TicketView run(const Job& job, const char* pageRange = "All", int expected = 0) {
@@ -79,8 +78,6 @@ protected:
         }
         return TicketView(job.output);
     }
-
-    vorlan::test::TempDir tmp;
 };
 
 const std::vector<LayerSpec> kSeparations = {{"Gold", true}, {"Silver", true}, {"CutContour", true}};
