@@ -183,9 +183,9 @@ Job writeJobForTicket(const fs::path& root, const fs::path& ticket) {
     pugi::xml_document doc;
     doc.load_file(ticket.c_str());
     std::map<std::string, int> pdfs;
-    for (pugi::xpath_node spec : doc.select_nodes("//*[local-name()='FileSpec'][@URL]")) {
-        int& pages = pdfs[fileNameOf(spec.node().attribute("URL").value())];
-        pages = std::max(pages, pagesUsed(spec.node()));
+    for (pugi::xpath_node fileSpec : doc.select_nodes("//*[local-name()='FileSpec'][@URL]")) {
+        int& pages = pdfs[fileNameOf(fileSpec.node().attribute("URL").value())];
+        pages = std::max(pages, pagesUsed(fileSpec.node()));
     }
     for (const auto& [name, pages] : pdfs)
         if (!name.empty()) vorlan::test::writeFile(job.dataFolder / name, vorlan::test::minimalPdf("0 0 m 10 10 l S", pages));
