@@ -42,49 +42,6 @@ LD_Surface* surfaceWithEverything() {
 
 }  // namespace
 
-TEST(Records, FreshWorkerDefaults) {
-    JDFinterface facade(nullptr, nullptr, nullptr);
-    EXPECT_EQ(facade.JDF_GetNumberOfLogicalPages(), 0);
-    EXPECT_EQ(facade.JDF_GetNumberOfLogicalDocs(), 1);
-    EXPECT_EQ(facade.JDF_GetNumberOfSignatures(), 0);
-    EXPECT_EQ(facade.JDF_GetNumberOfSheets(), 0);
-    EXPECT_EQ(facade.JDF_GetNumberOfSurfaces(), 0);
-    EXPECT_EQ(facade.JDF_GetMaxOrdinalNumber(), -1);
-    EXPECT_TRUE(facade.JDF_GetAllContentPDFs()->empty());
-    EXPECT_TRUE(facade.JDF_GetAllContentRuns()->empty());
-    EXPECT_TRUE(facade.JDF_GetGlobalRenderingParams()->Interleaved);
-    LD_OCG_Media* media = facade.JDF_GetGlobalMediaSettings();
-    EXPECT_STREQ(media->Class, L"Consumable");
-    EXPECT_EQ(media->status, 3);
-    EXPECT_EQ(media->width, -1);
-    EXPECT_EQ(media->height, -1);
-    EXPECT_THROW(facade.JDF_GetSignaturesInLayoutByIndex(0), std::out_of_range);
-    EXPECT_THROW(facade.JDF_GetRangeOfSheetsPerSignature(-1), std::out_of_range);
-}
-
-TEST(Records, NewRecordsCarryTheirDefaults) {
-    LD_ContentObject object;
-    EXPECT_NE(object.CTM, nullptr);
-    EXPECT_EQ(object.CTM->a, 1);
-    EXPECT_EQ(object.CTM->d, 1);
-    EXPECT_EQ(object.ClipBox, nullptr);
-    EXPECT_EQ(object.ClipPath, nullptr);
-    EXPECT_EQ(object.TrimCTM, nullptr);
-    EXPECT_EQ(object.TrimSize, nullptr);
-    EXPECT_EQ(object.Ord, -1);
-    LD_Run run;
-    EXPECT_EQ(run.NPage, -1);
-    EXPECT_EQ(run.SkipPage, 2147483647);
-    EXPECT_EQ(run.contentType, CONTENT_UNDEFINED);
-    LD_OCG_InterpretingParams params;
-    EXPECT_STREQ(params.OCGDefault, L"FromPDF");
-    EXPECT_STREQ(params.OCGIntent, L"View");
-    EXPECT_EQ(params.status, 7);
-    LD_Box box;
-    EXPECT_EQ(box.lowerLeft.x, -1);
-    EXPECT_EQ(box.upperRight.y, -1);
-}
-
 TEST(Records, TextBuffersCutLongValues) {
     wchar_t* buffer = LD_NewTextBuffer();
     std::wstring longText(2000, L'x');

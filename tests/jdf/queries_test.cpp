@@ -73,22 +73,4 @@ TEST_F(ReadQueries, LayoutAndNodes) {
     EXPECT_GT(LD_JDF::Debug_GetCurrTimeStampInMilliSeconds(), 1600000000000ULL);
 }
 
-TEST_F(ReadQueries, DebugPrinters) {
-    JDF::vElement elements{t->ticket->layoutElement, t->ticket->rootNode};
-    ::testing::internal::CaptureStdout();
-    EXPECT_EQ(t->Debug_TestVector(elements), LD_OK);
-    JDF::KElement layout = t->ticket->layoutElement;
-    t->Debug_TestElement(layout, 7);
-    std::string out = ::testing::internal::GetCapturedStdout();
-    EXPECT_NE(out.find("Testing Layout"), std::string::npos);
-    EXPECT_NE(out.find("Printing the 3 attribute(s) of Layout"), std::string::npos);
-    EXPECT_NE(out.find("Printing the 1 direct child(ren) of Layout"), std::string::npos);
-    EXPECT_NE(out.find("Printing all the 4 child(ren) of Layout"), std::string::npos);
-    EXPECT_NE(out.find("Part Attributes: "), std::string::npos);
-    elements.push_back(JDF::KElement());
-    ::testing::internal::CaptureStdout();
-    EXPECT_EQ(t->Debug_TestVector(elements), LD_FAILED);
-    ::testing::internal::GetCapturedStdout();
-}
-
 }  // namespace
