@@ -163,7 +163,7 @@ double recordsOnly(Heap heap, int surfaces, int repetitions) {
                 auto* sheet = new LD_Sheet;
                 w.sheets.push_back(sheet);
                 signature->sheetList.push_back(sheet);
-                LD_SetTextBuffer(sheet->name, L"Sheet");
+                LD_SetText(sheet->name, L"Sheet");
                 for (LD_Surface** side : {&sheet->front, &sheet->back}) {
                     auto* surface = *side = new LD_Surface;
                     w.surfaces.push_back(surface);
