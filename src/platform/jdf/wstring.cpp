@@ -3,15 +3,17 @@
 
 #include <charconv>
 #include <cstdio>
+#include <cstring>
 
-#include <pugixml.hpp>
+#include "platform/os/text.h"
 
 namespace JDF {
 
-WString::WString(const char* utf8) : std::wstring(utf8 ? pugi::as_wide(utf8) : std::wstring()) {}
-WString::WString(const std::string& utf8) : std::wstring(pugi::as_wide(utf8)) {}
+WString::WString(const char* utf8)
+    : std::wstring(utf8 ? vorlan::os::fromUtf8(utf8, std::strlen(utf8)) : std::wstring()) {}
+WString::WString(const std::string& utf8) : std::wstring(vorlan::os::fromUtf8(utf8)) {}
 
-std::string WString::getUTF8() const { return pugi::as_utf8(*this); }
+std::string WString::getUTF8() const { return vorlan::os::toUtf8(*this); }
 
 vWString WString::Tokenize(const WString& separators) const {
     return vWString(*this, separators);
