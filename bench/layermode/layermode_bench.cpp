@@ -15,12 +15,12 @@
 #include <cstdlib>
 #include <cstring>
 #include <filesystem>
-#include <sstream>
 #include <string>
 #include <vector>
 
 #include "child_process.h"
 #include "job_builder.h"
+#include "platform/os/text.h"
 #include "test_support.h"
 
 namespace fs = std::filesystem;
@@ -77,8 +77,7 @@ int consumeIn(const fs::path& root) {
 
 std::vector<int> sizesFrom(const std::string& list) {
     std::vector<int> sizes;
-    std::stringstream in(list);
-    for (std::string item; std::getline(in, item, ',');)
+    for (const std::string& item : vorlan::os::splitList<char>(list, ","))
         if (std::atoi(item.c_str()) > 0) sizes.push_back(std::atoi(item.c_str()));
     return sizes;
 }

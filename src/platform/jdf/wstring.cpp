@@ -34,15 +34,7 @@ WString WString::valueOf(double value) {
 }
 
 vWString::vWString(const WString& text, const WString& separators) {
-    size_t pos = 0;
-    while (pos < text.size()) {
-        size_t start = text.find_first_not_of(separators, pos);
-        if (start == WString::npos) break;
-        size_t end = text.find_first_of(separators, start);
-        if (end == WString::npos) end = text.size();
-        push_back(WString(text.substr(start, end - start)));
-        pos = end;
-    }
+    for (std::wstring& token : vorlan::os::splitList<wchar_t>(text, separators)) push_back(WString(std::move(token)));
 }
 
 bool vWString::contains(const WString& s) const { return index(s) >= 0; }

@@ -4,6 +4,8 @@
 #include <cstdint>
 #include <cwchar>
 #include <string>
+#include <string_view>
+#include <vector>
 
 namespace vorlan::os {
 
@@ -43,6 +45,27 @@ private:
     const char* text_ = small_;
     size_t size_ = 0;
 };
+
+// The one list splitter: the items of text between any of the separator characters, each without
+// the spaces around it. Runs of separators give no item; an item of spaces alone gives an empty one.
+template <typename Char>
+std::vector<std::basic_string<Char>> splitList(std::basic_string_view<Char> text,
+                                               std::basic_string_view<Char> separators) {
+    std::vector<std::basic_string<Char>> items;
+    size_t start = 0;
+    while (start < text.size()) {
+        size_t end = text.find_first_of(separators, start);
+        if (end == std::basic_string_view<Char>::npos) end = text.size();
+        if (end > start) {
+            std::basic_string_view<Char> item = text.substr(start, end - start);
+            while (!item.empty() && item.front() == Char(' ')) item.remove_prefix(1);
+            while (!item.empty() && item.back() == Char(' ')) item.remove_suffix(1);
+            items.emplace_back(item);
+        }
+        start = end + 1;
+    }
+    return items;
+}
 
 // Reads a number like the C runtime's _wtoi: leading white space, optional sign, decimal digits up
 // to the first other character; 0 when there are none. Saturates instead of overflowing.
