@@ -321,7 +321,7 @@ public:
     bool defaultLayerMode = false;
     bool exportMode = false;
     char* pageRange = nullptr;  // borrowed from the caller
-    int32_t pageRangeMode = 0;
+    int32_t pageRangeMode = PAGE_RANGE_ALL;  // a PageRangeMode
     std::vector<XMLSurfaceData*> surfaceVersions;
     int32_t jobNumber = -1;
     bool printDieLine = false;

@@ -20,8 +20,20 @@
 // buffer of 16-bit characters on the original platform).
 inline constexpr size_t LD_TEXT_BUFFER_CHARS = 512;
 
-// The JDF library's status value of the element a record describes (3 and 7 are set by us).
+// The JDF library's status value of the element a record describes.
 typedef int32_t LD_Status;
+// The status values the library sets: resources it writes are Available (the resource status
+// table's 7), the ticket's root node is Ready (the node status table's 3).
+inline constexpr LD_Status LD_RESOURCE_AVAILABLE = 7;
+inline constexpr LD_Status LD_NODE_READY = 3;
+
+// Which positions a page range selects: "All", "Odd", "Even", or a list of numbers and ranges.
+enum PageRangeMode : int32_t {
+    PAGE_RANGE_ALL = 0,
+    PAGE_RANGE_ODD = 1,
+    PAGE_RANGE_EVEN = 2,
+    PAGE_RANGE_LIST = 3,
+};
 // The JDF library's activation value of a process node.
 typedef int32_t LD_Activation;
 
@@ -135,7 +147,7 @@ struct LD_Run {
 struct LD_OCG_InterpretingParams {
     wchar_t* runName = nullptr;
     int32_t runNumber = 0;
-    LD_Status status = 7;
+    LD_Status status = LD_RESOURCE_AVAILABLE;
     bool OCGOnEmpty = false;
     wchar_t* OCGDefault = nullptr;  // "FromPDF"
     wchar_t* OCGIntent = nullptr;   // "View"

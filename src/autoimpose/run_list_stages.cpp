@@ -72,7 +72,7 @@ void moveTemplateRuns(TicketRewrite& t) {
     if (t.markCount == 0) return;
     JDF::JDFRunList markRuns = t.rootNode.AppendMatchingResource(L"RunList", 9);
     markRuns.AddRun(markFile, 0, -1);
-    markRuns.SetStatus(7);
+    markRuns.SetStatus(LD_RESOURCE_AVAILABLE);
     markRuns.SetRunTag(t.runTag());
     t.changes.marksRunList = true;
 }
@@ -115,7 +115,7 @@ void writeSheetRanges(TicketRewrite& t) {
         return;
     }
     JDF::JDFRunList output = t.rootNode.AppendMatchingResource(L"RunList", 2);
-    output.SetStatus(7);
+    output.SetStatus(LD_RESOURCE_AVAILABLE);
     output.setPartIDKeys(JDF::vWString{L"SheetIndex"});
     JDF::JDFResourceLink link = t.rootNode.GetLink(output);
     if (s.RangeType == 4)

@@ -30,7 +30,7 @@ bool rewrite(TicketRewrite& t, const JDF::XMLDoc& document) {
         t.changes.renderingParamsAdded = true;
     }
     rendering.SetInterleaved(true);
-    rendering.SetStatus(7);
+    rendering.SetStatus(LD_RESOURCE_AVAILABLE);
 
     writeDeliveryOptions(t);
     moveTemplateRuns(t);

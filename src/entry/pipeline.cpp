@@ -17,12 +17,12 @@
 
 namespace {
 
-int pageRangeModeOf(const char* pageRange) {
-    if (!pageRange) return 3;
-    if (std::strcmp(pageRange, "All") == 0) return 0;
-    if (std::strcmp(pageRange, "Odd") == 0) return 1;
-    if (std::strcmp(pageRange, "Even") == 0) return 2;
-    return 3;
+PageRangeMode pageRangeModeOf(const char* pageRange) {
+    if (!pageRange) return PAGE_RANGE_LIST;
+    if (std::strcmp(pageRange, "All") == 0) return PAGE_RANGE_ALL;
+    if (std::strcmp(pageRange, "Odd") == 0) return PAGE_RANGE_ODD;
+    if (std::strcmp(pageRange, "Even") == 0) return PAGE_RANGE_EVEN;
+    return PAGE_RANGE_LIST;
 }
 
 }  // namespace
@@ -74,7 +74,7 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
             inputPDF = new LD_PDF;
             LD_SetText(inputPDF->nativePath, dataPath);
             LD_SetText(inputPDF->mimeType, L"application/pdf");
-            inputPDF->status = 7;
+            inputPDF->status = LD_RESOURCE_AVAILABLE;
             break;
         default:
             return exitWith(LD_INVALID_INPUT);
@@ -159,7 +159,7 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
             inputPDF = new LD_PDF;
             LD_SetText(inputPDF->nativePath, found);
             LD_SetText(inputPDF->mimeType, L"application/pdf");
-            inputPDF->status = 7;
+            inputPDF->status = LD_RESOURCE_AVAILABLE;
             std::free(found);
             // The description was read before the PDF was found: its layers, kept under no PDF,
             // are this PDF's.

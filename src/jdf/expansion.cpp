@@ -166,7 +166,7 @@ LDError LD_JDF::createRunListAndInterpretingParamPairs(bool hasTicket) {
             }
             LD_SetText(params->runName, run->runName);
             params->runNumber = run->runNumber;
-            params->status = 7;
+            params->status = LD_RESOURCE_AVAILABLE;
             LD_SetText(params->OCGDefault, L"FromPDF");
             LD_SetText(params->OCGIntent, L"View");
             LD_SetText(params->OCGProcess, L"View");

@@ -26,7 +26,7 @@ bool injectLayout(const JDF::JDFNode& node, JDF::JDFLayout& layout, InjectedShee
     JDF::JDFNode target = node;
     layout = target.AppendMatchingResource(L"Layout", 1);
     if (layout.isNull()) return false;
-    layout.SetStatus(7);
+    layout.SetStatus(LD_RESOURCE_AVAILABLE);
     layout.setPartIDKeys(JDF::vWString(L"SignatureName SheetName Side"));
     layout.SetPartUsage(3);
     JDF::JDFLayout signature = layout.GetCreatePartition(33, L"SignatureName1");

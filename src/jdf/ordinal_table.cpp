@@ -44,7 +44,7 @@ LD_OrdinalTableElement* newRow(int32_t ordinal, int32_t logicalDocument) {
 // The parameters a pair gets when it enters the table.
 void prepareParams(LD_OCG_InterpretingParams* params) {
     if (!params) return;
-    params->status = 7;
+    params->status = LD_RESOURCE_AVAILABLE;
     LD_SetText(params->OCGDefault, L"FromPDF");
     LD_SetText(params->OCGIntent, L"View");
     LD_SetText(params->OCGProcess, L"View");

@@ -9,20 +9,19 @@
 
 namespace {
 
-enum RangeMode { kAll = 0, kOdd = 1, kEven = 2, kList = 3 };
 
 // Sets the bits [first, first + count) of the selection that the page-range mode selects, the
 // positions counted from 0 within that stretch. A list is parsed once by the caller.
 void selectStretch(std::vector<bool>& selection, size_t first, size_t count, int mode,
                    const std::vector<int32_t>& listed) {
     switch (mode) {
-        case kAll:
+        case PAGE_RANGE_ALL:
             for (size_t i = 0; i < count; ++i) selection[first + i] = true;
             break;
-        case kOdd:  // 1st, 3rd, … position
+        case PAGE_RANGE_ODD:  // 1st, 3rd, … position
             for (size_t i = 0; i < count; i += 2) selection[first + i] = true;
             break;
-        case kEven:
+        case PAGE_RANGE_EVEN:
             for (size_t i = 1; i < count; i += 2) selection[first + i] = true;
             break;
         default:
@@ -81,10 +80,10 @@ void LD_JDF::ConvertPageRangesToPages(std::vector<int32_t>& pages, int32_t limit
 }
 
 void LD_JDF::applyPageRangeForLayout() {
-    if (pageRangeMode == kAll) return;  // every surface keeps the selection the reader gave it
+    if (pageRangeMode == PAGE_RANGE_ALL) return;  // every surface keeps the selection the reader gave it
     std::vector<bool> selected(surfaces.size(), false);
     std::vector<int32_t> listed;
-    if (pageRangeMode == kList) ConvertPageRangesToPages(listed, static_cast<int32_t>(surfaces.size()));
+    if (pageRangeMode == PAGE_RANGE_LIST) ConvertPageRangesToPages(listed, static_cast<int32_t>(surfaces.size()));
     selectStretch(selected, 0, selected.size(), pageRangeMode, listed);
     for (size_t i = 0; i < surfaces.size(); ++i)
         if (surfaces[i]) surfaces[i]->isSelected = selected[i];
@@ -97,7 +96,7 @@ void LD_JDF::applyPageRangeForPDF() {
     for (XMLVersionData* version : versions)
         if (version && version->surfaces.size() > longest) longest = version->surfaces.size();
     std::vector<int32_t> listed;
-    if (pageRangeMode == kList)
+    if (pageRangeMode == PAGE_RANGE_LIST)
         ConvertPageRangesToPages(listed, longest > INT32_MAX ? INT32_MAX : static_cast<int32_t>(longest));
     for (XMLVersionData* version : versions) {
         if (!version) continue;  // a missing record selects nothing
@@ -116,7 +115,7 @@ void LD_JDF::applyPageRangeForPDFWithoutVersions() {
 std::vector<bool> selectPositions(LD_JDF& w, size_t count) {
     std::vector<bool> selected(count, false);
     std::vector<int32_t> listed;
-    if (w.pageRangeMode == kList)
+    if (w.pageRangeMode == PAGE_RANGE_LIST)
         w.ConvertPageRangesToPages(listed, count > INT32_MAX ? INT32_MAX : static_cast<int32_t>(count));
     selectStretch(selected, 0, count, w.pageRangeMode, listed);
     return selected;

@@ -127,7 +127,7 @@ void readRunListResource(RunListReading& reading, const JDF::JDFResource& resour
         int32_t i = 0;
         for (const JDF::KElement& child : resource.GetChildElementVector(L"RunList", L"*", {}, true, 0, false)) {
             JDF::JDFRunList partition(child);
-            if (partition.GetStatus() == 7) {
+            if (partition.GetStatus() == LD_RESOURCE_AVAILABLE) {
                 std::unique_ptr<LD_Run> run = makeRun(partition, i, true, &reading.pageCounts);
                 std::unique_ptr<LD_PDF> pdf;
                 if (!run->IsBlank) pdf = makePdf(partition, status, true);

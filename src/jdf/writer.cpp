@@ -51,7 +51,7 @@ JDF::WString pdfURL(LD_JDF& worker, LD_PDF* pdf) {
 JDF::JDFNode startCombinedNode(JDF::JDFDoc& doc, const wchar_t* types) {
     JDF::JDFNode root = need(JDF::JDFNode(doc.GetRoot()));
     root.SetActivation(6);
-    root.SetStatus(3);
+    root.SetStatus(LD_NODE_READY);
     root.SetType(L"Combined");
     root.SetTypes(JDF::vWString(types));
     root.SetAttribute(L"xmlns:KAV_tkt", kTicketExtensionNs);
@@ -59,8 +59,8 @@ JDF::JDFNode startCombinedNode(JDF::JDFDoc& doc, const wchar_t* types) {
 
     JDF::JDFRenderingParams rendering = need(root.AppendMatchingResource(L"RenderingParams", 1));
     rendering.SetInterleaved(true);
-    rendering.SetStatus(7);
-    need(root.AppendMatchingResource(L"DigitalPrintingParams", 1)).SetStatus(7);
+    rendering.SetStatus(LD_RESOURCE_AVAILABLE);
+    need(root.AppendMatchingResource(L"DigitalPrintingParams", 1)).SetStatus(LD_RESOURCE_AVAILABLE);
     return root;
 }
 

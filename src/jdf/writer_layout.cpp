@@ -79,7 +79,7 @@ namespace vorlan::jdf {
 bool writeLayout(LD_JDF& w, JDF::JDFNode& root) {
     if (w.signatures.empty()) return false;
     JDF::JDFLayout layout = need(root.AppendMatchingResource(L"Layout", 1));
-    layout.SetStatus(7);
+    layout.SetStatus(LD_RESOURCE_AVAILABLE);
     layout.SetPartUsage(3);
     for (size_t i = 0; i < w.signatures.size(); ++i) {
         LD_Signature* signature = w.signatures[i];
@@ -104,7 +104,7 @@ bool writeLayout(LD_JDF& w, JDF::JDFNode& root) {
                 setDimension(media, sheet->media->width, sheet->media->height);
             } else {
                 media = need(JDF::JDFMedia(root.AppendMatchingResource(L"Media", 1)));
-                media.SetStatus(7);
+                media.SetStatus(LD_RESOURCE_AVAILABLE);
                 setDimension(media, 612, 792);
                 need(jdfSheet.RefMedia(media));
             }

@@ -57,7 +57,7 @@ LD_OrdinalTableElement* rowOf(LD_JDF& w, int32_t k) {
 bool writeInterpretingParams(LD_JDF& w, JDF::JDFNode& root) {
     if (w.m_OrdinalTable.empty()) return false;
     JDF::JDFInterpretingParams resource = need(root.AppendMatchingResource(L"InterpretingParams", 1));
-    resource.SetStatus(7);
+    resource.SetStatus(LD_RESOURCE_AVAILABLE);
     if (w.layerDataMap.empty()) return true;  // no layers: one unpartitioned resource
     for (int32_t k = 0; k < tableSize(w); ++k) {
         LD_OrdinalTableElement* row = rowOf(w, k);
@@ -70,7 +70,7 @@ bool writeInterpretingParams(LD_JDF& w, JDF::JDFNode& root) {
 
 void writeContentRunList(LD_JDF& w, JDF::JDFNode& root) {
     JDF::JDFRunList runList = need(root.AppendMatchingResource(L"RunList", 10));
-    runList.SetStatus(7);
+    runList.SetStatus(LD_RESOURCE_AVAILABLE);
     const bool dieTags = !w.jobHasTicket || w.ticket->layoutElement.isNull();
     for (int32_t k = 0; k < tableSize(w); ++k) {
         LD_OrdinalTableElement* row = rowOf(w, k);
@@ -95,7 +95,7 @@ void writeContentRunList(LD_JDF& w, JDF::JDFNode& root) {
 
 void writeMarksRunList(LD_JDF& w, JDF::JDFNode& root) {
     JDF::JDFRunList runList = need(root.AppendMatchingResource(L"RunList", 9));
-    runList.SetStatus(7);
+    runList.SetStatus(LD_RESOURCE_AVAILABLE);
     for (int32_t k = 0; k < tableSize(w); ++k) {
         LD_OrdinalTableElement* row = rowOf(w, k);
         if (!row) throw WriteFailure{};

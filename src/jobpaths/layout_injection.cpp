@@ -133,7 +133,7 @@ LDError LayoutInjectionProcessingJdf::run() {
     LD_JDF& w = *worker_;
     if (!parseTicket()) return w.lastError = LD_JDF_UNUSABLE;
     collectRuns();
-    if (w.pageRangeMode != 0 && !buildRows()) return w.lastError = LD_JDF_UNUSABLE;
+    if (w.pageRangeMode != PAGE_RANGE_ALL && !buildRows()) return w.lastError = LD_JDF_UNUSABLE;
     if (w.printDieLine && (!dieOnly_.empty() || !dieWithContent_.empty())) {
         w.AddDieInfoFile("KVDieDefined", 1);
         w.setJobAttribute("KVDieDefined", "True");

@@ -33,20 +33,20 @@ void appendWholeRun(LD_JDF& w, JDF::JDFRunList& runList, int32_t& next, const LD
 
 LDError LayoutInjectionProcessingJdf::writeTicket() {
     LD_JDF& w = *worker_;
-    const bool listed = w.pageRangeMode == 3;
+    const bool listed = w.pageRangeMode == PAGE_RANGE_LIST;
     return vorlan::jdf::writeTicket(w, outputPath_.c_str(), [&](JDF::JDFDoc& doc) {
         JDF::JDFNode root = startCombinedNode(doc, listed ? L"Imposition Interpreting Rendering DigitalPrinting"
                                                           : L"Interpreting Rendering DigitalPrinting");
-        need(root.AppendMatchingResource(L"InterpretingParams", 1)).SetStatus(7);
+        need(root.AppendMatchingResource(L"InterpretingParams", 1)).SetStatus(LD_RESOURCE_AVAILABLE);
         if (!media_.isNull()) {
             JDF::JDFResource media = need(root.GetResourcePool().AppendResource(media_));
             need(JDF::JDFResourceLinkPool(root.GetResourceLinkPool()).AppendResource(media, true));
         }
         JDF::JDFRunList runList = need(JDF::JDFRunList(root.AppendMatchingResource(L"RunList", 10)));
-        runList.SetStatus(7);
+        runList.SetStatus(LD_RESOURCE_AVAILABLE);
 
         int32_t next = 0;
-        if (w.pageRangeMode == 0) {
+        if (w.pageRangeMode == PAGE_RANGE_ALL) {
             for (const Part* p : content_) appendWholeRun(w, runList, next, *p->run, p->url);
         } else {
             // One part per selected page, holding that page alone (not its run's whole page list,

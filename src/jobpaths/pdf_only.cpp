@@ -106,7 +106,7 @@ LDError PdfOnlyProcessingJdf::run() {
     makeRuns(pages);
 
     std::vector<bool> selected(static_cast<size_t>(pages), true);
-    if (w.pageRangeMode != 0) selected = selectPositions(w, static_cast<size_t>(pages));
+    if (w.pageRangeMode != PAGE_RANGE_ALL) selected = selectPositions(w, static_cast<size_t>(pages));
     pages_.clear();
     for (int32_t page = 0; page < pages; ++page)
         if (selected[static_cast<size_t>(page)]) pages_.push_back(page);

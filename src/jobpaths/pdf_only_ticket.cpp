@@ -35,18 +35,18 @@ LDError PdfOnlyProcessingJdf::writeTicket() {
     LD_JDF& w = *worker_;
     return vorlan::jdf::writeTicket(w, outputPath_.c_str(), [&](JDF::JDFDoc& doc) {
         JDF::JDFNode root = startCombinedNode(doc, L"Interpreting Rendering DigitalPrinting");
-        need(root.AppendMatchingResource(L"InterpretingParams", 1)).SetStatus(7);
+        need(root.AppendMatchingResource(L"InterpretingParams", 1)).SetStatus(LD_RESOURCE_AVAILABLE);
 
         // The first page's size as shown (width first); 0 0 when the page cannot be read.
         double height = 0, width = 0;
         const std::string input = vorlan::os::narrow(w.inputPDF->nativePath);
         getFirstPageSize(w.zipFileSystem, input.c_str(), &height, &width);
         JDF::JDFMedia media = need(JDF::JDFMedia(root.AppendMatchingResource(L"Media", 10)));
-        media.SetStatus(7);
+        media.SetStatus(LD_RESOURCE_AVAILABLE);
         media.SetDimension(JDF::JDFXYPair(width, height));
 
         JDF::JDFRunList runList = need(JDF::JDFRunList(root.AppendMatchingResource(L"RunList", 10)));
-        runList.SetStatus(7);
+        runList.SetStatus(LD_RESOURCE_AVAILABLE);
         int32_t next = 0;
         appendParts(w, runList, next, *contentRun_, pages_);
         if (w.dieEnabled && dieWithContentRun_) appendParts(w, runList, next, *dieWithContentRun_, pages_);

@@ -85,7 +85,7 @@ LDError SpotModeProcessingJdf::run() {
         return listed;
     }
     writeVariants();
-    if (w.pageRangeMode != 0) w.applyPageRangeForLayout();
+    if (w.pageRangeMode != PAGE_RANGE_ALL) w.applyPageRangeForLayout();
     if (w.dieEnabled) {
         addDieSheets();
         w.AddDieInfoFile("KVDieDefined", 1);

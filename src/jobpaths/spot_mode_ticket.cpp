@@ -42,7 +42,7 @@ void writeFile(LD_JDF& w, JDF::JDFRunList& part, LD_Run* run, int pass) {
 // A row without a page of the kind shows the page of ordinal 0.
 void writePasses(LD_JDF& w, JDF::JDFNode& root, bool marks, int passes) {
     JDF::JDFRunList runList = need(root.AppendMatchingResource(L"RunList", marks ? 9 : 10));
-    runList.SetStatus(7);
+    runList.SetStatus(LD_RESOURCE_AVAILABLE);
     const int32_t n = static_cast<int32_t>(w.m_OrdinalTable.size());
     LD_OrdinalTableElement* first = rowOf(w, 0);
     for (int pass = 0; pass < passes; ++pass) {
@@ -79,7 +79,7 @@ LDError SpotModeProcessingJdf::writeTicket() {
     return vorlan::jdf::writeTicket(w, outputPath_.c_str(), [&w](JDF::JDFDoc& doc) {
         JDF::JDFNode root = startCombinedNode(doc, L"Imposition Interpreting Rendering DigitalPrinting");
         writeLayout(w, root);
-        need(root.AppendMatchingResource(L"InterpretingParams", 1)).SetStatus(7);
+        need(root.AppendMatchingResource(L"InterpretingParams", 1)).SetStatus(LD_RESOURCE_AVAILABLE);
         const int passes = w.dieEnabled ? 3 : 1;
         if (!w.contentRuns.empty()) writePasses(w, root, false, passes);
         if (!w.markRuns.empty()) writePasses(w, root, true, passes);
