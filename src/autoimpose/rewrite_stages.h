@@ -5,6 +5,7 @@
 
 #include "autoimpose/auto_imposition.h"
 #include "platform/jdf/jdf.h"
+#include "vorlan/LD_Records.h"
 
 namespace vorlan::autoimpose {
 
