@@ -137,22 +137,35 @@ private:
         return tags;
     }
 
-    static const LD_OCG_Media* mediaOf(const LD_Sheet& sheet, const LD_Surface& surface, const LD_JDF& w) {
-        for (const LD_OCG_Media* media : {surface.media, sheet.media})
-            if (media && media->width > 0 && media->height > 0) return media;
-        for (const LD_Signature* signature : w.signatures)
-            if (signature->index == sheet.signatureIndex && signature->media && signature->media->width > 0 &&
-                signature->media->height > 0)
-                return signature->media;
-        return nullptr;
+    // The Dimension of the Media nearest the surface: a Media or MediaRef child of the surface
+    // element or of an element enclosing it (sheet, signature, layout partitions). The reader's
+    // media records hold only media typed as paper, so the ticket's own elements are asked.
+    bool mediaSize(const LD_Surface& surface, double& width, double& height) const {
+        const auto& elements = w_.ticket->surfaceElements;
+        if (surface.index < 0 || static_cast<size_t>(surface.index) >= elements.size()) return false;
+        const JDF::KElement& element = elements[static_cast<size_t>(surface.index)];
+        for (pugi::xml_node n = element.node(); n; n = n.parent()) {
+            for (pugi::xml_node child = n.first_child(); child; child = child.next_sibling()) {
+                const char* local = jdf::localName(child);
+                JDF::KElement media(child, element.document());
+                if (std::strcmp(local, "MediaRef") == 0) media = JDF::JDFElement(media).GetTarget();
+                else if (std::strcmp(local, "Media") != 0) continue;
+                if (media.isNull() || !media.HasAttribute(L"Dimension")) continue;
+                const JDF::JDFXYPair dimension = JDF::JDFMedia(media).GetDimension();
+                if (dimension.GetX() > 0 && dimension.GetY() > 0) {
+                    width = dimension.GetX();
+                    height = dimension.GetY();
+                    return true;
+                }
+            }
+        }
+        return false;
     }
 
     ProofPage page(const LD_Sheet& sheet, const LD_Surface& surface, const VersionTags& tags) {
         ProofPage page;
-        if (const LD_OCG_Media* media = mediaOf(sheet, surface, w_)) {
-            page.width = media->width;
-            page.height = media->height;
-        } else if (const LD_Box* box = surface.SurfaceContentsBox; box && box->upperRight.x > 0 && box->upperRight.y > 0) {
+        const LD_Box* box = surface.SurfaceContentsBox;
+        if (!mediaSize(surface, page.width, page.height) && box && box->upperRight.x > 0 && box->upperRight.y > 0) {
             page.width = box->upperRight.x;
             page.height = box->upperRight.y;
         }

@@ -12,7 +12,8 @@ namespace vorlan::pdf {
 
 // Reads the ticket at `ticketPath` into one ProofVersion per version, in order of first
 // appearance. Every printed surface (one with placed objects), in sheet order, front before
-// back, becomes a page of the version named by its KAV_tkt:VersionName (inherited from enclosing
+// back, becomes a page (the size of the Media nearest the surface in the ticket, else of its
+// SurfaceContentsBox, else of the first object's page) of the version named by its KAV_tkt:VersionName (inherited from enclosing
 // partitions), else by the version tags of the run-list partition of its first content object's
 // ordinal, else "Default"; a ticket without a layout has one page per logical page of its run
 // lists (the reader's one sheet per page). Each placed object takes the file and page of its
