@@ -152,13 +152,17 @@ TEST_F(Proofs, EachVersionShowsItsOwnLayersAndDieSheetsOnlyTheDie) {
 }
 
 TEST_F(Proofs, PlacedObjectsLandAndAreClippedWhereTheTicketSays) {
-    // A 300 x 400 page painted red at x 0..20 (a strip along its left edge).
+    // A 100 x 50 page painted red at x 0..20 (a strip along its left edge), as it stands and
+    // turned by /Rotate 90 (shown 50 x 100, the strip along its top edge).
     vorlan::test::TestPdf pdf;
     vorlan::test::TestPageOptions options;
     options.mediaBox = "[0 0 100 50]";
     pdf.addPage("1 0 0 rg 0 0 20 50 re f", "<< >>", options);
+    options.rotate = 90;
+    pdf.addPage("1 0 0 rg 0 0 20 50 re f", "<< >>", options);
     pdf.write((tmp / "strip.pdf").string());
     struct Case {
+        int page;
         const char* ctm;
         const char* clipBox;
         double x, y;
@@ -167,14 +171,15 @@ TEST_F(Proofs, PlacedObjectsLandAndAreClippedWhereTheTicketSays) {
     // Turned a quarter anticlockwise and doubled: (x, y) lands on (300 - 2y, 100 + 2x), so the
     // strip covers 200..300 x 100..140. The clip box keeps 200..250 of it.
     const Case cases[] = {
-        {"0 2 -2 0 300 100", "", 250, 120, kRed},      {"0 2 -2 0 300 100", "", 250, 200, kWhite},
-        {"0 2 -2 0 300 100", "", 150, 120, kWhite},    {"0 2 -2 0 300 100", "200 0 250 400", 225, 120, kRed},
-        {"0 2 -2 0 300 100", "200 0 250 400", 275, 120, kWhite},
-        {"1 0 0 1 30 60", "", 40, 80, kRed},           {"1 0 0 1 30 60", "", 60, 80, kWhite},
+        {0, "0 2 -2 0 300 100", "", 250, 120, kRed},    {0, "0 2 -2 0 300 100", "", 250, 200, kWhite},
+        {0, "0 2 -2 0 300 100", "", 150, 120, kWhite},  {0, "0 2 -2 0 300 100", "200 0 250 400", 225, 120, kRed},
+        {0, "0 2 -2 0 300 100", "200 0 250 400", 275, 120, kWhite},
+        {0, "1 0 0 1 30 60", "", 40, 80, kRed},         {0, "1 0 0 1 30 60", "", 60, 80, kWhite},
+        {1, "1 0 0 1 30 60", "", 55, 150, kRed},        {1, "1 0 0 1 30 60", "", 55, 100, kWhite},
     };
     for (const Case& c : cases) {
-        SCOPED_TRACE(std::string(c.ctm) + " clip " + c.clipBox);
-        vorlan::test::writeFile(tmp / "t.jdf", ticketFor({{"V", "strip.pdf", 0, c.ctm, c.clipBox}}));
+        SCOPED_TRACE(std::string(c.ctm) + " clip " + c.clipBox + " page " + std::to_string(c.page));
+        vorlan::test::writeFile(tmp / "t.jdf", ticketFor({{"V", "strip.pdf", c.page, c.ctm, c.clipBox}}));
         ASSERT_EQ(proof(tmp / "t.jdf", tmp / "out"), LD_OK);
         EXPECT_EQ(render(tmp / "out" / "V.pdf", 1).at(c.x, c.y, kDpi), c.expected);
     }
