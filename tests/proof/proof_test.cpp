@@ -30,7 +30,8 @@ vorlan::test::ColourImage render(const fs::path& pdf, int page) {
 }
 
 // The same page drawn `pages` times: English paints red and German blue on the same square,
-// the die green beside it; German and the die start off.
+// the die green beside it; German and the die start off. German is marked content inside a form
+// (taken out of the form for the versions that hide it), the die a form with its own /OC.
 void writeLayeredPdf(const fs::path& path, int pages) {
     vorlan::test::TestPdf pdf;
     QPDFObjectHandle en = pdf.object("<< /Type /OCG /Name (English) >>");
@@ -38,13 +39,17 @@ void writeLayeredPdf(const fs::path& path, int pages) {
     QPDFObjectHandle die = pdf.object("<< /Type /OCG /Name (Die) >>");
     const std::string r = " ", enRef = vorlan::test::TestPdf::ref(en), deRef = vorlan::test::TestPdf::ref(de),
                       dieRef = vorlan::test::TestPdf::ref(die);
+    const std::string form = "<< /Type /XObject /Subtype /Form /BBox [0 0 300 400] ";
+    QPDFObjectHandle german = pdf.stream(form + "/Resources << /Properties << /de " + deRef + " >> >> >>",
+                                         "/OC /de BDC 0 0 1 rg 50 50 100 100 re f EMC");
+    QPDFObjectHandle dieForm = pdf.stream(form + "/OC " + dieRef + " >>", "0 1 0 rg 200 50 50 50 re f");
     vorlan::test::TestPageOptions options;
     options.mediaBox = "[0 0 300 400]";
     for (int i = 0; i < pages; ++i)
-        pdf.addPage("/OC /en BDC 1 0 0 rg 50 50 100 100 re f EMC\n"
-                    "/OC /de BDC 0 0 1 rg 50 50 100 100 re f EMC\n"
-                    "/OC /die BDC 0 1 0 rg 200 50 50 50 re f EMC\n",
-                    "<< /Properties << /en " + enRef + " /de " + deRef + " /die " + dieRef + " >> >>", options);
+        pdf.addPage("/OC /en BDC 1 0 0 rg 50 50 100 100 re f EMC /German Do /Die Do",
+                    "<< /Properties << /en " + enRef + " >> /XObject << /German " + vorlan::test::TestPdf::ref(german) +
+                        " /Die " + vorlan::test::TestPdf::ref(dieForm) + " >> >>",
+                    options);
     pdf.qpdf().getRoot().replaceKey(
         "/OCProperties", QPDFObjectHandle::parse(&pdf.qpdf(), "<< /OCGs [" + enRef + r + deRef + r + dieRef +
                                                                   "] /D << /OFF [" + deRef + r + dieRef + "] >> >>"));
