@@ -71,32 +71,37 @@ int proof(const fs::path& ticket, const fs::path& folder, std::vector<Reported>*
 }
 
 // A ticket in the form the library writes: one sheet of 400 x 400 per placed object, its front
-// tagged with the version, the object's Ord its own run-list partition.
+// tagged with the version, the object's Ord its own partition of the content (or marks) run list.
 struct Placement {
     std::string version, file;
     int page = 0;
     std::string ctm = "1 0 0 1 0 0", clipBox;
+    bool mark = false;
 };
 
 std::string ticketFor(const std::vector<Placement>& placements) {
-    std::string runs, sheets;
+    std::string runs[2], sheets;
+    int ords[2] = {0, 0};
     for (size_t i = 0; i < placements.size(); ++i) {
         const Placement& p = placements[i];
-        const std::string ord = std::to_string(i);
-        runs += "<RunList Run=\"" + ord + "\" Pages=\"" + std::to_string(p.page) + "\"><LayoutElement><FileSpec URL=\"" +
-                p.file + "\" MimeType=\"application/pdf\"/></LayoutElement></RunList>\n";
-        sheets += "<Sheet Name=\"S" + ord + "\"><Media Dimension=\"400 400\"/><Surface Side=\"Front\" "
-                  "KAV_tkt:VersionName=\"" + p.version + "\" KAV_tkt:VersionCopyCount=\"1\">"
-                  "<ContentObject CTM=\"" + p.ctm + "\" Ord=\"" + ord + "\"" +
+        const std::string ord = std::to_string(ords[p.mark]++);
+        runs[p.mark] += "<RunList Run=\"" + ord + "\" Pages=\"" + std::to_string(p.page) +
+                        "\"><LayoutElement><FileSpec URL=\"" + p.file +
+                        "\" MimeType=\"application/pdf\"/></LayoutElement></RunList>\n";
+        sheets += "<Sheet Name=\"S" + std::to_string(i) + "\"><Media Dimension=\"400 400\"/><Surface Side=\"Front\" "
+                  "KAV_tkt:VersionName=\"" + p.version + "\" KAV_tkt:VersionCopyCount=\"1\"><" +
+                  (p.mark ? "MarkObject" : "ContentObject") + " CTM=\"" + p.ctm + "\" Ord=\"" + ord + "\"" +
                   (p.clipBox.empty() ? "" : " ClipBox=\"" + p.clipBox + "\"") + "/></Surface></Sheet>\n";
     }
     return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
            "<JDF xmlns=\"http://www.CIP4.org/JDFSchema_1_1\" xmlns:KAV_tkt=\"http://www.vorlan.org/JDF/ticket/1.0\" "
            "ID=\"n1\" JobPartID=\"n1\" Type=\"Imposition\" Status=\"Waiting\" Version=\"1.3\"><ResourcePool>\n"
-           "<RunList ID=\"rDoc\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n" + runs +
+           "<RunList ID=\"rDoc\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n" + runs[0] +
+           "</RunList><RunList ID=\"rMarks\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n" + runs[1] +
            "</RunList><Layout ID=\"rLayout\" Class=\"Parameter\" Status=\"Available\"><Signature Name=\"Sig1\">\n" +
            sheets + "</Signature></Layout></ResourcePool><ResourceLinkPool>"
            "<RunListLink rRef=\"rDoc\" Usage=\"Input\" ProcessUsage=\"Document\"/>"
+           "<RunListLink rRef=\"rMarks\" Usage=\"Input\" ProcessUsage=\"Marks\"/>"
            "<LayoutLink rRef=\"rLayout\" Usage=\"Input\"/></ResourceLinkPool></JDF>\n";
 }
 
@@ -172,6 +177,7 @@ TEST_F(Proofs, PlacedObjectsLandAndAreClippedWhereTheTicketSays) {
         const char* clipBox;
         double x, y;
         Rgb expected;
+        bool mark = false;
     };
     // Turned a quarter anticlockwise and doubled: (x, y) lands on (300 - 2y, 100 + 2x), so the
     // strip covers 200..300 x 100..140. The clip box keeps 200..250 of it.
@@ -181,10 +187,12 @@ TEST_F(Proofs, PlacedObjectsLandAndAreClippedWhereTheTicketSays) {
         {0, "0 2 -2 0 300 100", "200 0 250 400", 275, 120, kWhite},
         {0, "1 0 0 1 30 60", "", 40, 80, kRed},         {0, "1 0 0 1 30 60", "", 60, 80, kWhite},
         {1, "1 0 0 1 30 60", "", 55, 150, kRed},        {1, "1 0 0 1 30 60", "", 55, 100, kWhite},
+        {0, "1 0 0 1 30 60", "", 40, 80, kRed, true},   {0, "1 0 0 1 30 60", "30 60 35 110", 40, 80, kWhite, true},
     };
     for (const Case& c : cases) {
-        SCOPED_TRACE(std::string(c.ctm) + " clip " + c.clipBox + " page " + std::to_string(c.page));
-        vorlan::test::writeFile(tmp / "t.jdf", ticketFor({{"V", "strip.pdf", c.page, c.ctm, c.clipBox}}));
+        SCOPED_TRACE(std::string(c.ctm) + " clip " + c.clipBox + " page " + std::to_string(c.page) +
+                     (c.mark ? " mark" : ""));
+        vorlan::test::writeFile(tmp / "t.jdf", ticketFor({{"V", "strip.pdf", c.page, c.ctm, c.clipBox, c.mark}}));
         ASSERT_EQ(proof(tmp / "t.jdf", tmp / "out"), LD_OK);
         EXPECT_EQ(render(tmp / "out" / "V.pdf", 1).at(c.x, c.y, kDpi), c.expected);
     }
@@ -197,13 +205,13 @@ TEST_F(Proofs, AMissingFileOrPageFailsItsVersionAlone) {
         int result;
     };
     const Case cases[] = {
-        {{"B/../x", "missing.pdf", 0, "1 0 0 1 0 0", ""}, LD_FILE_NOT_FOUND},
-        {{"B/../x", "one.pdf", 3, "1 0 0 1 0 0", ""}, LD_REFERENCE_OUT_OF_RANGE},
+        {{"B/../x", "missing.pdf", 0, "1 0 0 1 0 0", "", false}, LD_FILE_NOT_FOUND},
+        {{"B/../x", "one.pdf", 3, "1 0 0 1 0 0", "", false}, LD_REFERENCE_OUT_OF_RANGE},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.result);
         vorlan::test::TempDir out;
-        vorlan::test::writeFile(tmp / "t.jdf", ticketFor({{"A", "one.pdf", 0, "1 0 0 1 0 0", ""}, c.broken}));
+        vorlan::test::writeFile(tmp / "t.jdf", ticketFor({{"A", "one.pdf", 0, "1 0 0 1 0 0", "", false}, c.broken}));
         std::vector<Reported> reported;
         EXPECT_EQ(proof(tmp / "t.jdf", out.path(), &reported), c.result);
         ASSERT_EQ(reported.size(), 2u);
