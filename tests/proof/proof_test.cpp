@@ -131,11 +131,14 @@ TEST_F(Proofs, EachVersionShowsItsOwnLayersAndDieSheetsOnlyTheDie) {
     writeLayeredPdf(job.dataFolder / "content.pdf", 4);
     ASSERT_EQ(consume(job), 0);
     const std::string ticketBefore = vorlan::test::readFile(job.output);
+    const std::string convertedBefore = vorlan::test::readFile(tmp / "out" / "out-0.pdf");
+    ASSERT_FALSE(convertedBefore.empty());
 
     std::vector<Reported> reported;
     ASSERT_EQ(proof(job.output, tmp / "proofs", &reported), LD_OK);
     ASSERT_EQ(reported.size(), 3u);
     EXPECT_EQ(vorlan::test::readFile(job.output), ticketBefore);
+    EXPECT_EQ(vorlan::test::readFile(tmp / "out" / "out-0.pdf"), convertedBefore);
     struct Expected {
         const char* version;
         int page;
@@ -157,6 +160,12 @@ TEST_F(Proofs, EachVersionShowsItsOwnLayersAndDieSheetsOnlyTheDie) {
         EXPECT_EQ(image.at(225, 75, kDpi), e.die);
         EXPECT_EQ(image.count(e.never), 0);
     }
+    // The labels name version, copies, sheet, side and content type.
+    std::string text;
+    ASSERT_EQ(vorlan::test::runCommand("pdftotext " + (tmp / "proofs" / "Default.pdf").string() + " -", &text), 0);
+    EXPECT_NE(text.find("Default | copies - | sheet 4 DieSheet | Back | DieOnly"), std::string::npos) << text;
+    ASSERT_EQ(vorlan::test::runCommand("pdftotext " + (tmp / "proofs" / "German.pdf").string() + " -", &text), 0);
+    EXPECT_NE(text.find("German | copies 10 | sheet 2 "), std::string::npos) << text;
     for (const Reported& r : reported) EXPECT_EQ(r.pages, r.version == "Default" ? 4 : 2) << r.version;
     EXPECT_EQ(vorlan::test::qpdfCheckPasses((tmp / "proofs" / "Default.pdf").string()), true);
 }
@@ -198,7 +207,7 @@ TEST_F(Proofs, PlacedObjectsLandAndAreClippedWhereTheTicketSays) {
     }
 }
 
-TEST_F(Proofs, AMissingFileOrPageFailsItsVersionAlone) {
+TEST_F(Proofs, AMissingFileOrPageFailsItsVersionAloneAndJobFilesStay) {
     vorlan::test::writeFile(tmp / "one.pdf", vorlan::test::minimalPdf("1 0 0 rg 0 0 50 50 re f"));
     struct Case {
         Placement broken;
@@ -221,5 +230,33 @@ TEST_F(Proofs, AMissingFileOrPageFailsItsVersionAlone) {
         EXPECT_EQ(fs::path(reported[1].path).parent_path(), out.path());
         EXPECT_FALSE(fs::exists(reported[1].path));
         EXPECT_EQ(render(out / "A.pdf", 1).at(25, 25, kDpi), kRed);
+    }
+    // A proof never replaces a file of the job: version "one" proofed into its PDF's folder.
+    vorlan::test::writeFile(tmp / "t.jdf", ticketFor({{"one", "one.pdf", 0, "1 0 0 1 0 0", "", false}}));
+    const std::string before = vorlan::test::readFile(tmp / "one.pdf");
+    EXPECT_EQ(proof(tmp / "t.jdf", tmp.path()), LD_FAILED);
+    EXPECT_EQ(vorlan::test::readFile(tmp / "one.pdf"), before);
+}
+
+TEST_F(Proofs, CorpusTicketsGiveAPagePerSurface) {
+    VORLAN_REQUIRE_CORPUS();
+    // Real layouts (rotated and scaled marks, many files in a sub-folder the URLs name), with a
+    // generated PDF for every file they name; none carries a version.
+    struct Case {
+        const char* ticket;
+        int surfaces;  // Surface elements of the ticket, each with placed objects
+    };
+    const Case cases[] = {{"elk_scale_rotate.jdf", 24}, {"elk_16er.jdf", 4}};
+    for (const Case& c : cases) {
+        SCOPED_TRACE(c.ticket);
+        vorlan::test::TempDir dir;
+        Job job = writeJobForTicket(dir.path(), vorlan::test::corpusDir() / "jdf" / c.ticket);
+        std::vector<Reported> reported;
+        ASSERT_EQ(proof(job.dataFolder / "ticket.jdf", dir / "proofs", &reported), LD_OK);
+        ASSERT_EQ(reported.size(), 1u);
+        EXPECT_EQ(reported[0].version, "Default");
+        EXPECT_EQ(reported[0].pages, c.surfaces);
+        vorlan::test::ColourImage first = render(reported[0].path, 1);
+        EXPECT_GT(first.width * first.height, first.count(kWhite));  // the generated pages' lines show
     }
 }
