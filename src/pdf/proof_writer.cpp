@@ -17,6 +17,7 @@
 #include "pdf/hidden_content.h"
 #include "pdf/pdf_document.h"
 #include "pdf/pdf_save.h"
+#include "platform/os/text.h"
 
 namespace vorlan::pdf {
 namespace {
@@ -64,16 +65,8 @@ PlacedPage shownGeometry(QPDFPageObjectHelper& page) {
 // The label as a PDF string of WinAnsi text: Latin-1 letters kept, other characters '?'.
 std::string labelString(const std::string& utf8) {
     std::string out = "(";
-    for (size_t i = 0; i < utf8.size();) {
-        unsigned char c = static_cast<unsigned char>(utf8[i]);
-        unsigned code = c;
-        size_t length = c < 0x80 ? 1 : c < 0xE0 ? 2 : c < 0xF0 ? 3 : 4;
-        if (length > 1) {
-            code = c & (0x3F >> (length - 1));
-            for (size_t k = 1; k < length && i + k < utf8.size(); ++k)
-                code = (code << 6) | (static_cast<unsigned char>(utf8[i + k]) & 0x3F);
-        }
-        i += length;
+    for (wchar_t c : os::fromUtf8(utf8)) {
+        unsigned code = static_cast<unsigned>(c);
         if (code < 0x20 || code == 0x7F || (code >= 0x80 && code < 0xA0) || code > 0xFF) code = '?';
         if (code == '(' || code == ')' || code == '\\') out += '\\';
         out += static_cast<char>(code);

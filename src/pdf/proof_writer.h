@@ -20,7 +20,8 @@ enum class ProofFailure {
 
 // Writes the version's proof to `path` (atomically; nothing is written when any object cannot be
 // drawn). A source page is placed as a form XObject made from it: its crop box, with /Rotate
-// applied, has its lower left corner at the origin the CTM maps from. Source files are opened
+// applied, has its lower left corner at the origin the CTM maps from; its annotations are not
+// drawn (they are no part of the page's content). Source files are opened
 // read-only and never written; `path` must not be one of them. *message says what failed (one
 // line naming the file, page or ordinal). Never throws.
 ProofFailure writeProof(const ProofVersion& version, const std::string& path, std::string* message);
