@@ -9,12 +9,9 @@
 // child, which other load on a shared machine disturbs far less than wall time; both are printed.
 #include <qpdf/QPDF.hh>
 
-#include <sys/resource.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 #include <algorithm>
-#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -28,7 +25,6 @@
 #include "pdf_bench_builder.h"
 
 namespace fs = std::filesystem;
-using Clock = std::chrono::steady_clock;
 using namespace vorlan::bench;
 
 namespace {
@@ -79,35 +75,10 @@ void generate(const fs::path& file, int pages, int elements) {
     writePages(pdf, resources, pages, [&](int p) { return pageContent(p, elements); }, file);
 }
 
-struct Measure {
-    double seconds = 0;
-    double cpu = 0;
-    long peakKb = 0;
-    int status = 0;
-};
-
-// Runs `work` in a child process: wall time, peak resident memory and exit status.
-Measure inChild(const std::function<int()>& work) {
-    Measure m;
-    const auto start = Clock::now();
-    const pid_t pid = fork();
-    if (pid == 0) _exit(work());
-    int status = 0;
-    rusage usage{};
-    wait4(pid, &status, 0, &usage);
-    m.seconds = std::chrono::duration<double>(Clock::now() - start).count();
-    m.peakKb = usage.ru_maxrss;
-    m.cpu = static_cast<double>(usage.ru_utime.tv_sec + usage.ru_stime.tv_sec) +
-            static_cast<double>(usage.ru_utime.tv_usec + usage.ru_stime.tv_usec) / 1e6;
-    m.status = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    return m;
-}
+using Measure = ChildRun;
 
 Measure qpdfLinearize(const fs::path& in, const fs::path& out) {
-    return inChild([&] {
-        execlp("qpdf", "qpdf", "--linearize", "--recompress-flate", in.c_str(), out.c_str(), static_cast<char*>(nullptr));
-        return 127;
-    });
+    return runProgram({"qpdf", "--linearize", "--recompress-flate", in.string(), out.string()});
 }
 
 // A bare-PDF job without layer mode, run by the command-line host in a process of its own (as
@@ -127,16 +98,9 @@ Measure pdfOnlyJob(const fs::path& dir, const fs::path& in) {
         std::fclose(out);
     }
     setenv("VORLAN_JOB_STORE", (dir / "store").c_str(), 1);
-    inChild([] {
-        execl(VORLAN_CLI, VORLAN_CLI, "job-attr", "1", "KVPrintDieLine", "True", static_cast<char*>(nullptr));
-        return 127;
-    });
-    return inChild([&] {
-        const std::string folder = dir.string(), out = (dir / "out").string(), ticket = (dir / "job.jdf").string();
-        execl(VORLAN_CLI, VORLAN_CLI, "consume", "--impinfo", description.c_str(), "--job-folder", folder.c_str(),
-              "--out-dir", out.c_str(), in.c_str(), ticket.c_str(), static_cast<char*>(nullptr));
-        return 127;
-    });
+    runProgram({VORLAN_CLI, "job-attr", "1", "KVPrintDieLine", "True"});
+    return runProgram({VORLAN_CLI, "consume", "--impinfo", description.string(), "--job-folder", dir.string(),
+                       "--out-dir", (dir / "out").string(), in.string(), (dir / "job.jdf").string()});
 }
 
 }  // namespace
@@ -159,19 +123,19 @@ int main(int argc, char** argv) {
     qpdfLinearize(in, dir / "warm.pdf");  // file cache
     for (int r = 0; r < runs; ++r) {  // interleaved, so all see the same machine load
         Measure q = qpdfLinearize(in, dir / "qpdf.pdf");
-        Measure c = inChild([&] {
+        Measure c = runInChild([&] {
             return vorlan::pdf::convertPDF(nullptr, in.c_str(), (dir / "converted.pdf").c_str(), seps, nullptr, 2, 0);
         });
-        Measure w = inChild([&] {
+        Measure w = runInChild([&] {
             return vorlan::pdf::rewriteSeparations(nullptr, in.c_str(), (dir / "rewritten.pdf").c_str(), keepList, true);
         });
         Measure j = pdfOnlyJob(dir, in);
         if (q.status || c.status || w.status || j.status)
             std::fprintf(stderr, "a run failed: qpdf %d, conversion %d, rewriting %d, PDF-only job %d\n", q.status,
                          c.status, w.status, j.status);
-        tj.push_back(j.seconds), cj.push_back(j.cpu), mj.push_back(static_cast<double>(j.peakKb));
+        tj.push_back(j.seconds), cj.push_back(j.cpuSeconds), mj.push_back(static_cast<double>(j.peakKb));
         tq.push_back(q.seconds), tc.push_back(c.seconds), tr.push_back(w.seconds);
-        cq.push_back(q.cpu), cc.push_back(c.cpu), cr.push_back(w.cpu);
+        cq.push_back(q.cpuSeconds), cc.push_back(c.cpuSeconds), cr.push_back(w.cpuSeconds);
         mq.push_back(static_cast<double>(q.peakKb)), mc.push_back(static_cast<double>(c.peakKb)),
             mr.push_back(static_cast<double>(w.peakKb));
     }

@@ -78,9 +78,4 @@ bool parsePdfBenchOptions(int argc, char** argv, const char* program, PdfBenchOp
     return true;
 }
 
-double median(std::vector<double> values) {
-    std::sort(values.begin(), values.end());
-    return values.empty() ? 0 : values[values.size() / 2];
-}
-
 }  // namespace vorlan::bench

@@ -9,6 +9,8 @@
 #include <qpdf/QPDF.hh>
 #include <qpdf/QPDFObjectHandle.hh>
 
+#include "child_process.h"
+
 namespace vorlan::bench {
 
 // "N 0 R" for an indirect object.
@@ -35,7 +37,5 @@ struct PdfBenchOptions {
 
 // Reads --pages N, --elements N, --runs N, --keep; false (after printing the usage) otherwise.
 bool parsePdfBenchOptions(int argc, char** argv, const char* program, PdfBenchOptions& options);
-
-double median(std::vector<double> values);
 
 }  // namespace vorlan::bench

@@ -2,17 +2,22 @@
 //
 // Records are plain structures created with new and referred to by raw pointers; a pointer may
 // stand in several lists, and exactly one owner list frees it. Text is wide, NUL-terminated and
-// allocated with the C allocator (free it with free()). "Text buffers" hold LD_TEXT_BUFFER_CHARS
-// wide characters including the terminator; values longer than that are cut, never overrun.
+// allocated with the C allocator (free it with free()). Each text is allocated at the length it
+// holds; the library reallocates it when it changes the text, so a text's address may change and
+// nothing outside the library writes into one. Texts set from a ticket or a description are cut
+// to LD_TEXT_BUFFER_CHARS - 1 characters (file paths made for a job are kept whole).
 #pragma once
 
 #include <cstdint>
 #include <cwchar>
+#include <initializer_list>
+#include <memory>
 #include <vector>
 
 #include "vorlan_export.h"
 
-// Characters in a fixed text buffer (a 1024-byte buffer of 16-bit characters on the original platform).
+// The longest text a ticket or description value is cut to, terminator included (a 1024-byte
+// buffer of 16-bit characters on the original platform).
 inline constexpr size_t LD_TEXT_BUFFER_CHARS = 512;
 
 // The JDF library's status value of the element a record describes (3 and 7 are set by us).
@@ -43,10 +48,47 @@ enum ContentType : int32_t {
 };
 
 // Wide text helpers for records. Every returned block is freed with free().
-wchar_t* LD_NewTextBuffer();                               // zeroed fixed text buffer
-wchar_t* LD_CopyText(const wchar_t* text);                 // exact-size copy; null for null
-void LD_SetTextBuffer(wchar_t* buffer, const wchar_t* text);  // copies, cutting at the buffer size
-void LD_FreeTextList(std::vector<wchar_t*>& list);         // frees every entry and clears
+wchar_t* LD_NewText(const wchar_t* text = L"");     // exact-size copy, cut to LD_TEXT_BUFFER_CHARS - 1
+wchar_t* LD_CopyText(const wchar_t* text);          // exact-size copy; null for null
+// Replaces field by text (empty for null), cut to LD_TEXT_BUFFER_CHARS - 1 characters and
+// reallocated at that length. When memory runs out the field keeps its old text.
+void LD_SetText(wchar_t*& field, const wchar_t* text);
+void LD_FreeTextList(std::vector<wchar_t*>& list);  // frees every entry and clears
+
+// The page list of a run. Copies share one list until one of them changes it (copy on write), so
+// copying a run that covers a whole document costs nothing until the copy's pages differ. Reads
+// look like those of a std::vector<int32_t>.
+class LD_PageList {
+public:
+    using value_type = int32_t;
+    using const_iterator = std::vector<int32_t>::const_iterator;
+
+    LD_PageList() = default;
+    LD_PageList(std::vector<int32_t> pages);  // NOLINT: a vector converts, as assignment did
+    LD_PageList(std::initializer_list<int32_t> pages) : LD_PageList(std::vector<int32_t>(pages)) {}
+
+    const std::vector<int32_t>& values() const;
+    operator const std::vector<int32_t>&() const { return values(); }  // NOLINT: reads as the vector
+    size_t size() const { return values().size(); }
+    bool empty() const { return values().empty(); }
+    const_iterator begin() const { return values().begin(); }
+    const_iterator end() const { return values().end(); }
+    int32_t front() const { return values().front(); }
+    int32_t operator[](size_t i) const { return values()[i]; }
+
+    void push_back(int32_t page);
+    void clear() { shared_.reset(); }
+    // Sorts ascending. A list already in order is left as it is (and stays shared).
+    void sort();
+    // Same pages in the same order; lists sharing storage compare in constant time.
+    bool operator==(const LD_PageList& other) const;
+    bool operator!=(const LD_PageList& other) const { return !(*this == other); }
+
+private:
+    struct Pages;
+    std::vector<int32_t>& own();  // this list's own storage, copied first if shared
+    std::shared_ptr<Pages> shared_;
+};
 
 struct LD_PDF {
     int32_t index = -1;
@@ -63,7 +105,7 @@ struct LD_PDF {
     bool secondVariantWritten = false;
     bool thirdVariantWritten = false;
 
-    LD_PDF();  // allocates the seven text buffers
+    LD_PDF();  // the seven texts start empty
     ~LD_PDF();
     LD_PDF(const LD_PDF&) = delete;
     LD_PDF& operator=(const LD_PDF&) = delete;
@@ -72,7 +114,7 @@ struct LD_PDF {
 struct LD_Run {
     wchar_t* runName = nullptr;
     int32_t runNumber = 0;
-    std::vector<int32_t> pages;
+    LD_PageList pages;
     int32_t NPage = -1;
     int32_t SkipPage = 2147483647;
     int32_t FirstPage = 2147483647;
@@ -84,7 +126,7 @@ struct LD_Run {
     int64_t VersionCopyCount = -1;
     ContentType contentType = CONTENT_UNDEFINED;
 
-    LD_Run();  // allocates runName
+    LD_Run();  // runName starts empty
     ~LD_Run();
     LD_Run(const LD_Run&) = delete;
     LD_Run& operator=(const LD_Run&) = delete;
@@ -266,7 +308,7 @@ struct LD_Sheet {
     int32_t index = -1;
     int32_t numberInSignature = -1;
     int32_t signatureIndex = -1;
-    wchar_t* name = nullptr;  // text buffer
+    wchar_t* name = nullptr;
     LD_Surface* front = nullptr;  // owned
     LD_Surface* back = nullptr;   // owned
     LD_OCG_Media* media = nullptr;
@@ -279,7 +321,7 @@ struct LD_Sheet {
 
 struct LD_Signature {
     int32_t index = -1;
-    wchar_t* name = nullptr;  // text buffer
+    wchar_t* name = nullptr;
     LD_Range sheetRange;
     std::vector<LD_Sheet*> sheetList;  // owned
     LD_OCG_Media* media = nullptr;

@@ -72,8 +72,8 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
         case INPUT_PDF:
             delete inputPDF;
             inputPDF = new LD_PDF;
-            LD_SetTextBuffer(inputPDF->nativePath, dataPath);
-            LD_SetTextBuffer(inputPDF->mimeType, L"application/pdf");
+            LD_SetText(inputPDF->nativePath, dataPath);
+            LD_SetText(inputPDF->mimeType, L"application/pdf");
             inputPDF->status = 7;
             break;
         default:
@@ -148,7 +148,7 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
                 for (LD_PDF* pdf : *list) {
                     wchar_t* found = findTicketFileInDir(dataPath, pdf->url);
                     if (!found) return exitWith(LD_FILE_NOT_FOUND);
-                    LD_SetTextBuffer(pdf->nativePath, found);
+                    LD_SetText(pdf->nativePath, found);
                     std::free(found);
                 }
             }
@@ -157,8 +157,8 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
             if (!found) return exitWith(LD_FILE_NOT_FOUND);
             delete inputPDF;
             inputPDF = new LD_PDF;
-            LD_SetTextBuffer(inputPDF->nativePath, found);
-            LD_SetTextBuffer(inputPDF->mimeType, L"application/pdf");
+            LD_SetText(inputPDF->nativePath, found);
+            LD_SetText(inputPDF->mimeType, L"application/pdf");
             inputPDF->status = 7;
             std::free(found);
             // The description was read before the PDF was found: its layers, kept under no PDF,

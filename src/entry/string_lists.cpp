@@ -25,19 +25,11 @@ void LD_JDF::parseStringAttributeToStringVector(wchar_t* value, std::vector<wcha
         list.clear();
         return;
     }
-    wchar_t* state = nullptr;
-    for (wchar_t* item = std::wcstok(value, L",", &state); item; item = std::wcstok(nullptr, L",", &state)) {
+    for (const std::wstring& item : vorlan::os::splitList<wchar_t>(value, L",")) {
         // Each entry is its own exact-size block so that the list's owner can free() it.
-        size_t length = std::wcslen(item);
-        auto* block = static_cast<wchar_t*>(std::malloc((length + 10) * sizeof(wchar_t)));
-        if (!block) {
-            lastError = LD_FAILED;
-            continue;
-        }
-        std::wmemcpy(block, item, length + 1);
-        wchar_t* trimmed = trimExtraSpaces(block);
-        if (trimmed != block) std::memmove(block, trimmed, (std::wcslen(trimmed) + 1) * sizeof(wchar_t));
-        list.push_back(block);
+        wchar_t* block = LD_CopyText(item.c_str());
+        if (block) list.push_back(block);
+        else lastError = LD_FAILED;
     }
 }
 
@@ -56,13 +48,12 @@ void LD_JDF::parseRangeAttributeToIntVector(wchar_t* value, std::vector<long>& l
         list.clear();
         return;
     }
-    wchar_t* state = nullptr;
-    for (wchar_t* item = std::wcstok(value, L", ", &state); item; item = std::wcstok(nullptr, L", ", &state)) {
+    for (std::wstring& item : vorlan::os::splitList<wchar_t>(value, L", ")) {
         long first = 0, last = 0;
-        if (isRange(item, first, last)) {
+        if (isRange(item.data(), first, last)) {
             for (long n = first; n <= last && list.size() < kMaxRangeValues; ++n) list.push_back(n);
         } else if (list.size() < kMaxRangeValues) {
-            list.push_back(vorlan::os::wtoi(item));
+            list.push_back(vorlan::os::wtoi(item.c_str()));
         }
     }
 }

@@ -12,7 +12,7 @@ LD_Sheet* newDieSheet(const LD_Sheet& sheet) {
     made->index = sheet.index;
     made->numberInSignature = sheet.numberInSignature;
     made->signatureIndex = sheet.signatureIndex;
-    LD_SetTextBuffer(made->name, L"DieSheet");
+    LD_SetText(made->name, L"DieSheet");
     if (sheet.media) made->media = new LD_OCG_Media(*sheet.media);
     return made;
 }

@@ -164,12 +164,12 @@ LDError LD_JDF::createRunListAndInterpretingParamPairs(bool hasTicket) {
                 copyOCGVec(params->m_OCGOn, layers->defaultOnOCGNames);
                 copyOCGVec(params->m_OCGOff, layers->defaultOffOCGNames);
             }
-            LD_SetTextBuffer(params->runName, run->runName);
+            LD_SetText(params->runName, run->runName);
             params->runNumber = run->runNumber;
             params->status = 7;
-            LD_SetTextBuffer(params->OCGDefault, L"FromPDF");
-            LD_SetTextBuffer(params->OCGIntent, L"View");
-            LD_SetTextBuffer(params->OCGProcess, L"View");
+            LD_SetText(params->OCGDefault, L"FromPDF");
+            LD_SetText(params->OCGIntent, L"View");
+            LD_SetText(params->OCGProcess, L"View");
             params->runNumbers.push_back(run->runNumber);
             m_InterpretingParams.push_back(params);
         }

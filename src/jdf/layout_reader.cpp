@@ -63,15 +63,17 @@ bool namedNode(pugi::xml_node n, const char* name) {
 
 bool named(const JDF::KElement& e, const char* name) { return namedNode(e.node(), name); }
 
-// LD_SetTextBuffer of the UTF-8 text, without a wide copy on the way for ASCII text.
-void setTextBuffer(wchar_t* buffer, const char* text) {
+// LD_SetText of the UTF-8 text, without a heap-allocated wide copy on the way for ASCII text.
+void setText(wchar_t*& field, const char* text) {
     if (!isAscii(text)) {
-        LD_SetTextBuffer(buffer, JDF::WString(text).c_str());
+        LD_SetText(field, JDF::WString(text).c_str());
         return;
     }
+    wchar_t wide[LD_TEXT_BUFFER_CHARS];
     size_t i = 0;
-    for (; text[i] && i < LD_TEXT_BUFFER_CHARS - 1; ++i) buffer[i] = static_cast<wchar_t>(text[i]);
-    buffer[i] = L'\0';
+    for (; text[i] && i < LD_TEXT_BUFFER_CHARS - 1; ++i) wide[i] = static_cast<wchar_t>(text[i]);
+    wide[i] = L'\0';
+    LD_SetText(field, wide);
 }
 
 // Calls fn(child) for each child element as JDFElement::GetChildElementVector(L"*", L"*") gives
@@ -204,7 +206,7 @@ private:
         auto* signature = new LD_Signature;
         w_.signatures.push_back(signature);
         bool nested = named(element, "Signature");
-        setTextBuffer(signature->name, element.node().attribute(nested ? "Name" : "SignatureName").value());
+        setText(signature->name, element.node().attribute(nested ? "Name" : "SignatureName").value());
         signature->index = w_.numberOfSignatures;
         signature->sheetRange.first = w_.numberOfSheets;
 
@@ -231,7 +233,7 @@ private:
         sheet->numberInSignature = number;
         sheet->signatureIndex = signature.index;
         bool nested = named(element, "Sheet");
-        setTextBuffer(sheet->name, element.node().attribute(nested ? "Name" : "SheetName").value());
+        setText(sheet->name, element.node().attribute(nested ? "Name" : "SheetName").value());
 
         forEachChildElement(element, [&](const JDF::KElement& child) {
             if (named(child, "Layout") || named(child, "Surface")) {

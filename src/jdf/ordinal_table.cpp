@@ -45,9 +45,9 @@ LD_OrdinalTableElement* newRow(int32_t ordinal, int32_t logicalDocument) {
 void prepareParams(LD_OCG_InterpretingParams* params) {
     if (!params) return;
     params->status = 7;
-    LD_SetTextBuffer(params->OCGDefault, L"FromPDF");
-    LD_SetTextBuffer(params->OCGIntent, L"View");
-    LD_SetTextBuffer(params->OCGProcess, L"View");
+    LD_SetText(params->OCGDefault, L"FromPDF");
+    LD_SetText(params->OCGIntent, L"View");
+    LD_SetText(params->OCGProcess, L"View");
     params->OCGOnEmpty = params->m_OCGOn.empty();
 }
 
@@ -131,11 +131,11 @@ int32_t LD_JDF::updateAndAppendToOrdinalTable(LD_Run* run, LD_OCG_InterpretingPa
     wchar_t name[32];
     std::swprintf(name, 32, L"%d", runNumber);
     if (run) {
-        LD_SetTextBuffer(run->runName, name);
+        LD_SetText(run->runName, name);
         run->runNumber = runNumber;
     }
     if (params) {
-        LD_SetTextBuffer(params->runName, name);
+        LD_SetText(params->runName, name);
         params->runNumber = runNumber;
         ticket->indexes.params.invalidate();
     }
@@ -226,8 +226,8 @@ bool LD_JDF::areRunsEqual(LD_Run* a, LD_Run* b) {
     fillPagesFromRange(a);
     fillPagesFromRange(b);
     if (a->pages.size() != b->pages.size()) return false;
-    std::sort(a->pages.begin(), a->pages.end());
-    std::sort(b->pages.begin(), b->pages.end());
+    a->pages.sort();
+    b->pages.sort();
     return a->pages == b->pages;
 }
 

@@ -15,7 +15,7 @@ LD_Run* newPageRun(LD_PDF* pdf, int32_t page, ContentType type) {
 
 LD_Run* copyRun(const LD_Run* run) {
     auto* made = new LD_Run;
-    LD_SetTextBuffer(made->runName, run->runName);
+    LD_SetText(made->runName, run->runName);
     made->runNumber = run->runNumber;
     made->pages = run->pages;
     made->NPage = run->NPage;

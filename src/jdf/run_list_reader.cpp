@@ -71,7 +71,7 @@ std::unique_ptr<LD_Run> makeRun(const JDF::JDFRunList& element, int32_t runNumbe
     run->EndOfDocument = element.GetEndOfDocument();
     if (partition) run->IsBlank = element.GetLayoutElement().IsBlank();
     run->contentType = CONTENT_CONTENT;
-    LD_SetTextBuffer(run->runName, element.GetRun().c_str());
+    LD_SetText(run->runName, element.GetRun().c_str());
     try {
         run->pages = expandPages(element, pageCounts);
     } catch (const JDF::JDFException&) {
@@ -86,11 +86,11 @@ namespace {
 std::unique_ptr<LD_PDF> makePdf(const JDF::JDFRunList& element, LD_Status status, bool lowerCaseMime) {
     auto pdf = std::make_unique<LD_PDF>();
     JDF::JDFFileSpec fileSpec = element.GetLayoutElement().GetFileSpec();
-    LD_SetTextBuffer(pdf->url, fileSpec.GetURL().c_str());
+    LD_SetText(pdf->url, fileSpec.GetURL().c_str());
     std::wstring mime = fileSpec.GetMimeType();
     if (lowerCaseMime)
         for (wchar_t& c : mime) c = static_cast<wchar_t>(std::towlower(static_cast<wint_t>(c)));
-    LD_SetTextBuffer(pdf->mimeType, mime.c_str());
+    LD_SetText(pdf->mimeType, mime.c_str());
     pdf->status = status;
     return pdf;
 }

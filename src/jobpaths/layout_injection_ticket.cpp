@@ -18,7 +18,7 @@ void appendWholeRun(LD_JDF& w, JDF::JDFRunList& runList, int32_t& next, const LD
     pages.Append(0, -1);
     if (run.NPage > 0) part.SetNPage(run.NPage);
     if (!run.pages.empty()) {
-        std::vector<int32_t> listed = run.pages;
+        std::vector<int32_t> listed = run.pages.values();
         pages = JDF::JDFIntegerRangeList();
         w.convertPagesVecToJDFRangeList(listed, pages);
     } else if (run.FirstPage < run.NPage) {

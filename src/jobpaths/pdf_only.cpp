@@ -47,7 +47,7 @@ void PdfOnlyProcessingJdf::buildSeparationLists() {
 LD_PDF* PdfOnlyProcessingJdf::variantPdf(const std::string& path) {
     auto pdf = std::make_unique<LD_PDF>();
     vorlan::jobpaths::setVariantPath(pdf->convertedPath, path);
-    LD_SetTextBuffer(pdf->mimeType, worker_->inputPDF->mimeType);
+    LD_SetText(pdf->mimeType, worker_->inputPDF->mimeType);
     pdf->status = worker_->inputPDF->status;
     pdf->converted = true;
     variants_.push_back(std::move(pdf));

@@ -138,7 +138,7 @@ LD_Surface* LD_Surface::copy() const {
     return made;
 }
 
-LD_Sheet::LD_Sheet() : name(LD_NewTextBuffer()) {}
+LD_Sheet::LD_Sheet() : name(LD_NewText()) {}
 
 LD_Sheet::~LD_Sheet() {
     std::free(name);
@@ -147,7 +147,7 @@ LD_Sheet::~LD_Sheet() {
     if (back != front) delete back;
 }
 
-LD_Signature::LD_Signature() : name(LD_NewTextBuffer()) {}
+LD_Signature::LD_Signature() : name(LD_NewText()) {}
 
 LD_Signature::~LD_Signature() {
     std::free(name);

@@ -4,9 +4,9 @@
 #include "vorlan/LD_Records.h"
 
 LD_PDF::LD_PDF()
-    : url(LD_NewTextBuffer()), mimeType(LD_NewTextBuffer()), nativePath(LD_NewTextBuffer()),
-      convertedPath(LD_NewTextBuffer()), firstVariantPath(LD_NewTextBuffer()),
-      secondVariantPath(LD_NewTextBuffer()), thirdVariantPath(LD_NewTextBuffer()) {}
+    : url(LD_NewText()), mimeType(LD_NewText()), nativePath(LD_NewText()),
+      convertedPath(LD_NewText()), firstVariantPath(LD_NewText()),
+      secondVariantPath(LD_NewText()), thirdVariantPath(LD_NewText()) {}
 
 LD_PDF::~LD_PDF() {
     for (wchar_t* text : {url, mimeType, nativePath, convertedPath, firstVariantPath, secondVariantPath,
@@ -14,7 +14,7 @@ LD_PDF::~LD_PDF() {
         std::free(text);
 }
 
-LD_Run::LD_Run() : runName(LD_NewTextBuffer()) {}
+LD_Run::LD_Run() : runName(LD_NewText()) {}
 
 LD_Run::~LD_Run() {
     std::free(runName);
@@ -22,12 +22,8 @@ LD_Run::~LD_Run() {
 }
 
 LD_OCG_InterpretingParams::LD_OCG_InterpretingParams()
-    : runName(LD_NewTextBuffer()), OCGDefault(LD_NewTextBuffer()), OCGIntent(LD_NewTextBuffer()),
-      OCGProcess(LD_NewTextBuffer()) {
-    LD_SetTextBuffer(OCGDefault, L"FromPDF");
-    LD_SetTextBuffer(OCGIntent, L"View");
-    LD_SetTextBuffer(OCGProcess, L"View");
-}
+    : runName(LD_NewText()), OCGDefault(LD_NewText(L"FromPDF")), OCGIntent(LD_NewText(L"View")),
+      OCGProcess(LD_NewText(L"View")) {}
 
 LD_OCG_InterpretingParams::~LD_OCG_InterpretingParams() {
     for (wchar_t* text : {runName, OCGDefault, OCGIntent, OCGProcess}) std::free(text);

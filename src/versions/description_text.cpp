@@ -38,7 +38,7 @@ void appendNameList(LD_JDF& worker, const _kvXmlNode* node, const char* name, st
     std::vector<wchar_t*> items;
     const LDError before = worker.lastError;
     worker.lastError = LD_OK;
-    worker.parseStringAttributeToStringVector(value.data(), items);  // splits value in place
+    worker.parseStringAttributeToStringVector(value.data(), items);
     const bool lost = worker.lastError != LD_OK;                      // an item could not be copied
     worker.lastError = before;
     try {

@@ -42,12 +42,33 @@ LD_Surface* surfaceWithEverything() {
 
 }  // namespace
 
-TEST(Records, TextBuffersCutLongValues) {
-    wchar_t* buffer = LD_NewTextBuffer();
+TEST(Records, TextsAreCutAndMayBeSetFromThemselves) {
+    wchar_t* text = LD_NewText();
     std::wstring longText(2000, L'x');
-    LD_SetTextBuffer(buffer, longText.c_str());
-    EXPECT_EQ(std::wcslen(buffer), LD_TEXT_BUFFER_CHARS - 1);
-    std::free(buffer);
+    LD_SetText(text, longText.c_str());
+    EXPECT_EQ(std::wcslen(text), LD_TEXT_BUFFER_CHARS - 1);
+    LD_SetText(text, text + 500);  // a text's own tail
+    EXPECT_EQ(std::wstring(text), std::wstring(11, L'x'));
+    LD_SetText(text, nullptr);
+    EXPECT_STREQ(text, L"");
+    std::free(text);
+}
+
+// A copied run shares its pages until either changes them; a change never shows in the other.
+TEST(Records, RunPageListsCopyOnWrite) {
+    LD_PageList original = {5, 3, 9};
+    LD_PageList copy = original, appended = original;
+    copy.sort();
+    appended.push_back(1);
+    EXPECT_EQ(original.values(), (std::vector<int32_t>{5, 3, 9}));
+    EXPECT_EQ(copy.values(), (std::vector<int32_t>{3, 5, 9}));
+    EXPECT_EQ(appended.values(), (std::vector<int32_t>{5, 3, 9, 1}));
+    LD_PageList sorted = copy;
+    sorted.sort();  // already in order: stays shared, still equal
+    EXPECT_EQ(sorted, copy);
+    copy.clear();
+    EXPECT_TRUE(copy.empty());
+    EXPECT_EQ(sorted.size(), 3u);
 }
 
 TEST(Records, SurfaceCopySharesNoPointer) {

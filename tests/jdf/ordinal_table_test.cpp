@@ -11,7 +11,7 @@ class OrdinalTable : public ::testing::Test {
 protected:
     LD_PDF* pdf(const wchar_t* url) {
         auto* p = new LD_PDF;
-        LD_SetTextBuffer(p->url, url);
+        LD_SetText(p->url, url);
         w.contentPDFs.push_back(p);
         return p;
     }

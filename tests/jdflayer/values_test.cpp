@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include "platform/jdf/jdf.h"
+#include "platform/os/text.h"
 
 using namespace JDF;
 
@@ -24,6 +25,26 @@ TEST(JdfValues, IntegerRangeListsParseExpandAndWrite) {
     built.Append(0, -1);
     EXPECT_EQ(built.GetString(), L"5 ~ 6 2 0 ~ -1");
     EXPECT_EQ(JDFIntegerRangeList(built.GetString()).GetString(), built.GetString());
+}
+
+// The one UTF-8 decoder: each ill-formed sequence becomes one U+FFFD and reading goes on.
+TEST(JdfValues, Utf8DecodingRejectsIllFormedSequences) {
+    const struct {
+        const char* bytes;
+        const wchar_t* text;
+    } cases[] = {
+        {"a\xF0\x9F\x98\x80", L"a\U0001F600"},      // four bytes, well formed
+        {"\xC0\xAF", L"\uFFFD\uFFFD"},                // overlong '/'
+        {"\xE0\x80\xAF", L"\uFFFD\uFFFD\uFFFD"},     // overlong, three bytes
+        {"\xED\xA0\x80x", L"\uFFFD\uFFFD\uFFFDx"},   // a surrogate
+        {"\xF4\x90\x80\x80", L"\uFFFD\uFFFD\uFFFD\uFFFD"},  // beyond U+10FFFF
+        {"\xE2\x82", L"\uFFFD\uFFFD"},                // cut short
+    };
+    for (const auto& c : cases) EXPECT_EQ(WString(c.bytes), c.text) << c.bytes;
+    // Encoding: a long text leaves the stack buffer and converts whole.
+    std::wstring longText(1000, L'\u20ac');
+    EXPECT_EQ(vorlan::os::Utf8Text(longText).size(), 3000u);
+    EXPECT_EQ(vorlan::os::toUtf8(std::wstring(1, static_cast<wchar_t>(0xD800))), "\xEF\xBF\xBD");
 }
 
 TEST(JdfValues, PairsRectanglesAndMatrices) {

@@ -165,8 +165,12 @@ std::string descriptionXml(const std::vector<LayerSpec>& layers, const std::vect
     return x.str();
 }
 
+Job ticketJobAt(const fs::path& root) {
+    return {root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo", root / "out.jdf"};
+}
+
 Job writeTicketJob(const fs::path& root, const TicketSpec& shape, const std::string& description) {
-    Job job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo", root / "out.jdf"};
+    Job job = ticketJobAt(root);
     vorlan::test::writeFile(job.dataFile, "data file of job 1\n");
     vorlan::test::writeFile(job.dataFolder / "ticket.jdf", ticketXml(shape));
     for (const std::string& pdf : shape.pdfs) vorlan::test::writeFile(job.dataFolder / pdf, vorlan::test::minimalPdf());
@@ -176,7 +180,7 @@ Job writeTicketJob(const fs::path& root, const TicketSpec& shape, const std::str
 }
 
 Job writeJobForTicket(const fs::path& root, const fs::path& ticket) {
-    Job job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo", root / "out.jdf"};
+    Job job = ticketJobAt(root);
     vorlan::test::writeFile(job.dataFile, "data file of job 1\n");
     fs::create_directories(job.dataFolder);
     fs::copy_file(ticket, job.dataFolder / "ticket.jdf");

@@ -65,6 +65,8 @@ struct Job {
     std::filesystem::path output;      // X/out.jdf
 };
 
+// The paths of a ticket job in root (nothing is written).
+Job ticketJobAt(const std::filesystem::path& root);
 // A ticket job: the ticket, a one-page PDF for every name in shape.pdfs (and marks.pdf), and the
 // description (none when empty).
 Job writeTicketJob(const std::filesystem::path& root, const TicketSpec& shape, const std::string& description);

@@ -27,7 +27,7 @@ struct BarePdf {
     LD_JDF w;
     explicit BarePdf(int n) {
         w.inputPDF = new LD_PDF;
-        LD_SetTextBuffer(w.inputPDF->nativePath, L"/jobs/a.pdf");
+        LD_SetText(w.inputPDF->nativePath, L"/jobs/a.pdf");
         auto* layers = new XMLLayerData;
         layers->layerOCGNames = names({L"Art", L"Die"});
         layers->sepOCGNames = names({L"White"});
@@ -80,7 +80,7 @@ TEST(Expansion, TicketJobsThatAreNotFailures) {
     w.jobHasTicket = true;
     for (const wchar_t* name : {L"/jobs/a.pdf", L"/jobs/b.pdf"}) {
         auto* pdf = new LD_PDF;
-        LD_SetTextBuffer(pdf->nativePath, name);
+        LD_SetText(pdf->nativePath, name);
         w.contentPDFs.push_back(pdf);
         auto* run = new LD_Run;
         run->pdf = pdf;
@@ -203,8 +203,8 @@ TEST(DieSteps, LayoutDieSheetsShareRowsForTheSamePage) {
     w.sheets.push_back(sheet);
     w.surfaces.push_back(surface);
     auto* pdf = new LD_PDF;
-    LD_SetTextBuffer(pdf->url, L"a.pdf");
-    LD_SetTextBuffer(pdf->nativePath, L"/jobs/a.pdf");
+    LD_SetText(pdf->url, L"a.pdf");
+    LD_SetText(pdf->nativePath, L"/jobs/a.pdf");
     w.contentPDFs.push_back(pdf);
     auto* run = new LD_Run;
     run->pdf = pdf;

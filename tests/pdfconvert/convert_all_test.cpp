@@ -53,7 +53,7 @@ struct Job {
 
     LD_PDF* addPdf(std::vector<const wchar_t*> layers = {}) {
         auto* pdf = new LD_PDF;
-        LD_SetTextBuffer(pdf->nativePath, vorlan::os::widen(input.c_str()).c_str());
+        LD_SetText(pdf->nativePath, vorlan::os::widen(input.c_str()).c_str());
         worker.contentPDFs.push_back(pdf);
         auto* data = new XMLLayerData;
         for (const wchar_t* l : layers) data->layerOCGNames.push_back(copy(l));

@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "commands.h"
+#include "platform/os/text.h"
 #include "pdf/separation_layers.h"
 #include "pdf/separation_rewrite.h"
 
@@ -13,15 +14,7 @@ namespace vorlan::cli {
 namespace {
 
 std::vector<std::string> splitList(const std::string& text) {
-    std::vector<std::string> names;
-    size_t start = 0;
-    while (start <= text.size() && !text.empty()) {
-        size_t comma = text.find(',', start);
-        if (comma == std::string::npos) comma = text.size();
-        if (comma > start) names.push_back(text.substr(start, comma - start));
-        start = comma + 1;
-    }
-    return names;
+    return vorlan::os::splitList<char>(text, ",");
 }
 
 std::vector<const char*> pointers(const std::vector<std::string>& names) {

@@ -61,7 +61,7 @@ const vWString& tokensOf(const wchar_t* table) {
 
 }  // namespace
 
-WString Token(const wchar_t* table, int n, bool allowUnknown) {
+const WString& Token(const wchar_t* table, int n, bool allowUnknown) {
     if (n < 0 || (n == 0 && !allowUnknown))
         throw JDFException("enumeration value " + std::to_string(n) + " cannot be written");
     const vWString& tokens = tokensOf(table);

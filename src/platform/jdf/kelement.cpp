@@ -7,6 +7,7 @@
 #include <string>
 
 #include "platform/jdf/node_walk.h"
+#include "platform/os/text.h"
 
 namespace JDF {
 namespace {
@@ -62,18 +63,18 @@ void collectPrefixes(pugi::xml_node top, std::set<std::string>& out) {
 // Finds the attribute for key (and optional namespace) on n.
 pugi::xml_attribute findAttribute(pugi::xml_node n, const WString& key, const WString& ns) {
     if (!n) return {};
-    std::string k = key.getUTF8();
+    const vorlan::os::Utf8Text k(key);
     if (pugi::xml_attribute a = n.attribute(k.c_str())) {
-        if (ns.empty() || k.find(':') != std::string::npos) return a;
+        if (ns.empty() || std::strchr(k.c_str(), ':')) return a;
         // Unprefixed attribute asked for in a namespace: accept when that is the element's own.
         std::string uri;
         lookupNamespace(n, prefixOf(n.name()), uri);
         if (WString(uri) == ns) return a;
     }
-    if (ns.empty() || k.find(':') != std::string::npos) return {};
+    if (ns.empty() || std::strchr(k.c_str(), ':')) return {};
     for (pugi::xml_attribute a = n.first_attribute(); a; a = a.next_attribute()) {
         std::string p = prefixOf(a.name());
-        if (p.empty() || p == "xmlns" || k != localOf(a.name())) continue;
+        if (p.empty() || p == "xmlns" || std::strcmp(k.c_str(), localOf(a.name())) != 0) continue;
         std::string uri;
         if (lookupNamespace(n, p, uri) && WString(uri) == ns) return a;
     }
@@ -129,7 +130,7 @@ double KElement::GetRealAttribute(const WString& key, const WString& ns, double 
 
 void KElement::SetAttribute(const WString& key, const WString& value, const WString& ns) {
     if (!node_) return;
-    std::string k = key.getUTF8();
+    const vorlan::os::Utf8Text k(key);
     std::string p = prefixOf(k.c_str());
     if (!ns.empty() && !p.empty() && p != "xmlns") {
         std::string uri;
@@ -146,8 +147,8 @@ void KElement::SetAttribute(const WString& key, const WString& value, const WStr
     }
     pugi::xml_attribute a = node_.attribute(k.c_str());
     if (!a) a = node_.append_attribute(k.c_str());
-    a.set_value(value.getUTF8().c_str());
-    if (doc_ && k == "ID") doc_->IDSet(a.value(), node_);
+    a.set_value(vorlan::os::Utf8Text(value).c_str());
+    if (doc_ && std::strcmp(k.c_str(), "ID") == 0) doc_->IDSet(a.value(), node_);
 }
 
 void KElement::SetAttribute(const WString& key, int value, const WString& ns) {

@@ -3,15 +3,17 @@
 
 #include <charconv>
 #include <cstdio>
+#include <cstring>
 
-#include <pugixml.hpp>
+#include "platform/os/text.h"
 
 namespace JDF {
 
-WString::WString(const char* utf8) : std::wstring(utf8 ? pugi::as_wide(utf8) : std::wstring()) {}
-WString::WString(const std::string& utf8) : std::wstring(pugi::as_wide(utf8)) {}
+WString::WString(const char* utf8)
+    : std::wstring(utf8 ? vorlan::os::fromUtf8(utf8, std::strlen(utf8)) : std::wstring()) {}
+WString::WString(const std::string& utf8) : std::wstring(vorlan::os::fromUtf8(utf8)) {}
 
-std::string WString::getUTF8() const { return pugi::as_utf8(*this); }
+std::string WString::getUTF8() const { return vorlan::os::toUtf8(*this); }
 
 vWString WString::Tokenize(const WString& separators) const {
     return vWString(*this, separators);
@@ -32,15 +34,7 @@ WString WString::valueOf(double value) {
 }
 
 vWString::vWString(const WString& text, const WString& separators) {
-    size_t pos = 0;
-    while (pos < text.size()) {
-        size_t start = text.find_first_not_of(separators, pos);
-        if (start == WString::npos) break;
-        size_t end = text.find_first_of(separators, start);
-        if (end == WString::npos) end = text.size();
-        push_back(WString(text.substr(start, end - start)));
-        pos = end;
-    }
+    for (std::wstring& token : vorlan::os::splitList<wchar_t>(text, separators)) push_back(WString(std::move(token)));
 }
 
 bool vWString::contains(const WString& s) const { return index(s) >= 0; }

@@ -37,7 +37,7 @@ class vWString : public std::vector<WString> {
 public:
     vWString() = default;
     vWString(std::initializer_list<WString> items) : std::vector<WString>(items) {}
-    // The tokens of text split at the separator characters.
+    // The tokens of text split at the separator characters (spaces around each are dropped).
     explicit vWString(const WString& text, const WString& separators = L" \t\r\n");
 
     // True when one entry equals s exactly.

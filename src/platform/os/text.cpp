@@ -59,55 +59,81 @@ std::wstring widen(const char* text) {
     return result;
 }
 
-std::string toUtf8(const wchar_t* text) { return text ? toUtf8(std::wstring(text)) : std::string(); }
-
-std::string toUtf8(const std::wstring& text) {
-    std::string out;
-    out.reserve(text.size());
-    for (wchar_t wc : text) {
-        auto cp = static_cast<uint32_t>(wc);
-        if (cp > 0x10FFFF || (cp >= 0xD800 && cp <= 0xDFFF)) cp = 0xFFFD;
-        if (cp < 0x80) {
-            out += static_cast<char>(cp);
-        } else if (cp < 0x800) {
-            out += static_cast<char>(0xC0 | (cp >> 6));
-            out += static_cast<char>(0x80 | (cp & 0x3F));
-        } else if (cp < 0x10000) {
-            out += static_cast<char>(0xE0 | (cp >> 12));
-            out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
-            out += static_cast<char>(0x80 | (cp & 0x3F));
-        } else {
-            out += static_cast<char>(0xF0 | (cp >> 18));
-            out += static_cast<char>(0x80 | ((cp >> 12) & 0x3F));
-            out += static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
-            out += static_cast<char>(0x80 | (cp & 0x3F));
-        }
+size_t encodeUtf8(wchar_t wc, char* out) {
+    auto cp = static_cast<uint32_t>(wc);
+    if (cp > 0x10FFFF || (cp >= 0xD800 && cp <= 0xDFFF)) cp = 0xFFFD;
+    if (cp < 0x80) {
+        out[0] = static_cast<char>(cp);
+        return 1;
     }
+    if (cp < 0x800) {
+        out[0] = static_cast<char>(0xC0 | (cp >> 6));
+        out[1] = static_cast<char>(0x80 | (cp & 0x3F));
+        return 2;
+    }
+    if (cp < 0x10000) {
+        out[0] = static_cast<char>(0xE0 | (cp >> 12));
+        out[1] = static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
+        out[2] = static_cast<char>(0x80 | (cp & 0x3F));
+        return 3;
+    }
+    out[0] = static_cast<char>(0xF0 | (cp >> 18));
+    out[1] = static_cast<char>(0x80 | ((cp >> 12) & 0x3F));
+    out[2] = static_cast<char>(0x80 | ((cp >> 6) & 0x3F));
+    out[3] = static_cast<char>(0x80 | (cp & 0x3F));
+    return 4;
+}
+
+std::string toUtf8(const wchar_t* text) { return text ? toUtf8(text, std::wcslen(text)) : std::string(); }
+std::string toUtf8(const std::wstring& text) { return toUtf8(text.data(), text.size()); }
+
+std::string toUtf8(const wchar_t* text, size_t length) {
+    std::string out;
+    out.reserve(length);
+    char bytes[4];
+    for (size_t i = 0; i < length; ++i) out.append(bytes, encodeUtf8(text[i], bytes));
     return out;
 }
 
-std::wstring fromUtf8(const std::string& bytes) {
+Utf8Text::Utf8Text(const wchar_t* text, size_t length) {
+    size_t used = 0;
+    for (size_t i = 0; i < length; ++i) {
+        if (used + 4 >= sizeof small_) {  // too long for the stack: convert it all on the heap
+            large_ = toUtf8(text, length);
+            text_ = large_.c_str();
+            size_ = large_.size();
+            return;
+        }
+        used += encodeUtf8(text[i], small_ + used);
+    }
+    small_[used] = '\0';
+    size_ = used;
+}
+
+// Well-formed UTF-8 only: a lead byte with the right number of continuation bytes, the shortest
+// form of its code point, no surrogate and nothing above U+10FFFF; each ill-formed sequence
+// becomes one U+FFFD and reading goes on at the next byte.
+std::wstring fromUtf8(const char* bytes, size_t size) {
     std::wstring out;
-    out.reserve(bytes.size());
+    out.reserve(size);
+    static constexpr uint32_t kSmallest[] = {0, 0x80, 0x800, 0x10000};
     size_t i = 0;
-    while (i < bytes.size()) {
+    while (i < size) {
         auto lead = static_cast<unsigned char>(bytes[i]);
         int extra = lead < 0x80 ? 0 : (lead >> 5) == 0x6 ? 1 : (lead >> 4) == 0xE ? 2 : (lead >> 3) == 0x1E ? 3 : -1;
-        if (extra < 0 || i + static_cast<size_t>(extra) >= bytes.size()) {
+        if (extra < 0 || static_cast<size_t>(extra) >= size - i) {
             out += L'\uFFFD';
             ++i;
             continue;
         }
         uint32_t cp = extra == 0 ? lead : lead & (0x3F >> extra);
         bool ok = true;
-        for (int k = 1; k <= extra; ++k) {
-            auto cont = static_cast<unsigned char>(bytes[i + k]);
-            if ((cont & 0xC0) != 0x80) {
-                ok = false;
-                break;
-            }
+        for (int k = 1; k <= extra && ok; ++k) {
+            auto cont = static_cast<unsigned char>(bytes[i + static_cast<size_t>(k)]);
+            ok = (cont & 0xC0) == 0x80;
             cp = (cp << 6) | (cont & 0x3F);
         }
+        ok = ok && cp >= kSmallest[extra] && cp <= 0x10FFFF && !(cp >= 0xD800 && cp <= 0xDFFF);
         if (!ok) {
             out += L'\uFFFD';
             ++i;
@@ -118,6 +144,8 @@ std::wstring fromUtf8(const std::string& bytes) {
     }
     return out;
 }
+
+std::wstring fromUtf8(const std::string& bytes) { return fromUtf8(bytes.data(), bytes.size()); }
 
 namespace {
 

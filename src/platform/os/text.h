@@ -4,6 +4,8 @@
 #include <cstdint>
 #include <cwchar>
 #include <string>
+#include <string_view>
+#include <vector>
 
 namespace vorlan::os {
 
@@ -16,11 +18,54 @@ wchar_t* wideCopy(const char* text);
 std::string narrow(const wchar_t* text);    // empty for null
 std::wstring widen(const char* text);        // empty for null
 
-// UTF-8 bytes of a wide string, whatever the locale (code points above 0x10FFFF become U+FFFD).
-std::string toUtf8(const wchar_t* text);
+// The one UTF-8 conversion of the library, whatever the locale. Encoding: surrogates and values
+// above U+10FFFF become U+FFFD. Decoding: every ill-formed sequence (bad lead or continuation
+// byte, overlong form, surrogate, beyond U+10FFFF, cut short) becomes one U+FFFD.
+size_t encodeUtf8(wchar_t character, char* out);  // writes 1 to 4 bytes; returns how many
+std::string toUtf8(const wchar_t* text);          // empty for null
 std::string toUtf8(const std::wstring& text);
-// Wide string from UTF-8; malformed bytes become U+FFFD.
+std::string toUtf8(const wchar_t* text, size_t length);
+std::wstring fromUtf8(const char* bytes, size_t size);
 std::wstring fromUtf8(const std::string& bytes);
+
+// UTF-8 of a wide text, held on the stack when short: the conversion for the many short names
+// and values written into documents, without a heap block each.
+class Utf8Text {
+public:
+    Utf8Text(const wchar_t* text, size_t length);
+    explicit Utf8Text(const std::wstring& text) : Utf8Text(text.data(), text.size()) {}
+    Utf8Text(const Utf8Text&) = delete;
+    Utf8Text& operator=(const Utf8Text&) = delete;
+    const char* c_str() const { return text_; }
+    size_t size() const { return size_; }
+
+private:
+    char small_[256];
+    std::string large_;
+    const char* text_ = small_;
+    size_t size_ = 0;
+};
+
+// The one list splitter: the items of text between any of the separator characters, each without
+// the spaces around it. Runs of separators give no item; an item of spaces alone gives an empty one.
+template <typename Char>
+std::vector<std::basic_string<Char>> splitList(std::basic_string_view<Char> text,
+                                               std::basic_string_view<Char> separators) {
+    std::vector<std::basic_string<Char>> items;
+    size_t start = 0;
+    while (start < text.size()) {
+        size_t end = text.find_first_of(separators, start);
+        if (end == std::basic_string_view<Char>::npos) end = text.size();
+        if (end > start) {
+            std::basic_string_view<Char> item = text.substr(start, end - start);
+            while (!item.empty() && item.front() == Char(' ')) item.remove_prefix(1);
+            while (!item.empty() && item.back() == Char(' ')) item.remove_suffix(1);
+            items.emplace_back(item);
+        }
+        start = end + 1;
+    }
+    return items;
+}
 
 // Reads a number like the C runtime's _wtoi: leading white space, optional sign, decimal digits up
 // to the first other character; 0 when there are none. Saturates instead of overflowing.
