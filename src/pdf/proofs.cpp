@@ -71,7 +71,7 @@ int writeProofs(const char* ticketPath, const char* outputFolder, ProofCallback 
             reportVersion(report, userData, version, path, written, message);
         }
         return result;
-    } catch (const std::exception&) {
+    } catch (...) {  // nothing thrown below may reach the host
         return LD_FAILED;
     }
 }
