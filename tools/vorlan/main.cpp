@@ -5,7 +5,7 @@
 
 #include "cli_support.h"
 #include "commands.h"
-#include "platform/os/text.h"
+#include "host_api.h"
 
 namespace {
 
