@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
 # Builds the fuzz preset (clang, libFuzzer, AddressSanitizer + UndefinedBehaviorSanitizer) and runs
-# every fuzzer for a bounded time (FUZZ_SECONDS, default 60) from its seed corpus.
+# every fuzzer for a bounded time (FUZZ_SECONDS, default 30) from its seed corpus.
 #
 # Conventions: a fuzz target is an executable named *_fuzzer built from fuzz/<area>/; its seeds are
 # fuzz/<area>/corpus/ (plus the shared corpus files fuzz/<area>/seeds-from-shared names) and its
@@ -13,7 +13,7 @@
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
-seconds="${FUZZ_SECONDS:-60}"
+seconds="${FUZZ_SECONDS:-30}"
 build=build/fuzz
 
 locked() {
@@ -21,15 +21,19 @@ locked() {
 }
 
 locked cmake --preset fuzz >/dev/null
-if [ -n "${FUZZ_TARGETS:-}" ]; then
-  targets="$FUZZ_TARGETS"
-else
-  # Every target the fuzz build knows whose name ends in _fuzzer.
-  targets=$(cmake --build "$build" --target help 2>/dev/null | grep -oE '[A-Za-z0-9_]+_fuzzer$' | sort -u || true)
+# Every target declared with vorlan_fuzzer() under fuzz/: each must be known to the build, so a
+# target that the configuration lost fails the run instead of being skipped.
+declared=$(sed -nE 's/^[[:space:]]*vorlan_fuzzer\(([A-Za-z0-9_]+).*/\1/p' fuzz/*/CMakeLists.txt | sort -u)
+known=$(cmake --build "$build" --target help 2>/dev/null | grep -oE '[A-Za-z0-9_]+_fuzzer$' | sort -u || true)
+missing=$(comm -23 <(echo "$declared") <(echo "$known"))
+if [ -n "$missing" ]; then
+  echo "fuzz-short: declared but unknown to the build: $missing" >&2
+  exit 1
 fi
+targets="${FUZZ_TARGETS:-$declared}"
 if [ -z "$targets" ]; then
-  echo "fuzz-short: no fuzz targets"
-  exit 0
+  echo "fuzz-short: no fuzz targets" >&2
+  exit 1
 fi
 # shellcheck disable=SC2086
 locked cmake --build "$build" -j2 --target $targets
