@@ -8,7 +8,8 @@
 # to a scratch corpus, so new inputs never land in the repository. A crash leaves its input in
 # build/fuzz/artifacts/ and fails the script.
 #
-# Environment: FUZZ_SECONDS (per fuzzer), FUZZ_TARGETS (space-separated target names; default all),
+# Environment: FUZZ_SECONDS (per fuzzer), FUZZ_RUNS (optional: also stop a fuzzer after this many
+# executions), FUZZ_TARGETS (space-separated target names; default all),
 # VORLAN_BUILD_LOCK (a lock file to hold while building, for machines where builds must not overlap).
 set -euo pipefail
 cd "$(dirname "$0")/.."
@@ -62,6 +63,7 @@ for target in $targets; do
   fi
   options=(-max_total_time="$seconds" -timeout=10 -rss_limit_mb=2048 -max_len=65536
            -print_final_stats=1 -artifact_prefix="$build/artifacts/$target-")
+  if [ -n "${FUZZ_RUNS:-}" ]; then options+=(-runs="$FUZZ_RUNS"); fi
   if [ -f "fuzz/$area/fuzz.dict" ]; then options+=(-dict="fuzz/$area/fuzz.dict"); fi
   echo "fuzz-short: $target for ${seconds}s"
   if ! ASAN_OPTIONS="detect_leaks=1:${ASAN_OPTIONS:-}" "$binary" "${options[@]}" "$scratch" \
@@ -70,7 +72,7 @@ for target in $targets; do
     tail -n 40 "$build/artifacts/$target.log" >&2
     status=1
   else
-    grep -E 'stat::number_of_executed_units|stat::peak_rss_mb' "$build/artifacts/$target.log" | sed "s/^/  /"
+    grep -E 'stat::number_of_executed_units|stat::peak_rss_mb|Done [0-9]+ runs' "$build/artifacts/$target.log" | sed "s/^/  /"
   fi
   rm -rf "$scratch"
 done
