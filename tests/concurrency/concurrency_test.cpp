@@ -22,10 +22,12 @@ TEST(Concurrency, JobsOnSeparateThreadsWriteWhatEachWritesAlone) {
     std::vector<std::map<std::string, std::string>> alone;
     for (size_t i = 0; i < jobs.size(); ++i) {
         jobs[i].prepare(folder(i));
-        const auto inputs = folderContents(folder(i)).size();
         aloneResults.push_back(jobs[i].run(folder(i)));
         alone.push_back(folderContents(folder(i)));
-        EXPECT_GT(alone.back().size(), inputs) << jobs[i].name << " wrote nothing";
+        EXPECT_EQ(aloneResults.back(), jobs[i].expected) << jobs[i].name;
+        std::string written;
+        for (const auto& file : alone.back()) written += " " + file.first;
+        EXPECT_EQ(alone.back().count(jobs[i].writes), 1u) << jobs[i].name << " wrote only" << written;
         fs::remove_all(folder(i));
         jobs[i].prepare(folder(i));
     }

@@ -20,9 +20,9 @@ const std::vector<LayerSpec> kSeparations = {{"Gold", true}, {"Varnish", true}, 
 
 // Every surface of the job switches the same object lists.
 VersionSpec version(const std::string& name, int surfaces, const std::string& layerOn, const std::string& layerOff,
-                    const std::string& sepOn) {
+                    const std::string& sepOn, const std::string& sepOff = "") {
     VersionSpec v{name, 10, true, {}};
-    for (int s = 0; s < surfaces; ++s) v.surfaces.push_back({s, {{s, layerOn, layerOff, sepOn, ""}}});
+    for (int s = 0; s < surfaces; ++s) v.surfaces.push_back({s, {{s, layerOn, layerOff, sepOn, sepOff}}});
     return v;
 }
 
@@ -39,15 +39,18 @@ std::vector<MixedJob> mixedJobs(int pages) {
     std::vector<MixedJob> jobs;
     jobs.push_back({"layer mode with conversion",
                     [=](const fs::path& root) {
+                        const DieSpec die{true, "", "Varnish"};
                         Job job = writeTicketJob(root, ticketOf(pages),
-                                                 descriptionXml(kLayers, {version("English", surfaces, "English", "German", ""),
-                                                                          version("German", surfaces, "German", "English", "")}));
+                                                 descriptionXml(kLayers, {version("English", surfaces, "English", "German", "", "Varnish"),
+                                                                          version("German", surfaces, "German", "English", "")},
+                                                                &die));
                         vorlan::test::writeSpotPdf((job.dataFolder / "content.pdf").string(), kInks, surfaces);
                     },
                     [=](const fs::path& root) {
                         return consume(Job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo",
                                            root / "out.jdf"});
-                    }});
+                    },
+                    0, "out/out-0.pdf"});
     jobs.push_back({"spot mode",
                     [=](const fs::path& root) {
                         const DieSpec die{true, "", "CutContour"};
@@ -59,7 +62,8 @@ std::vector<MixedJob> mixedJobs(int pages) {
                     [=](const fs::path& root) {
                         return consume(Job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo",
                                            root / "out.jdf"});
-                    }});
+                    },
+                    0, "out/out-0.pdf"});
     jobs.push_back({"PDF only",
                     [=](const fs::path& root) {
                         const DieSpec die{true, "", "CutContour"};
@@ -69,7 +73,8 @@ std::vector<MixedJob> mixedJobs(int pages) {
                     },
                     [=](const fs::path& root) {
                         return consume(Job{root, root / "job1.pdf", root, root / "job1.impinfo", root / "out.jdf"});
-                    }});
+                    },
+                    0, "out/out-2.pdf"});
     jobs.push_back({"ink scan",
                     [=](const fs::path& root) {
                         vorlan::test::TestPdf pdf;
@@ -83,7 +88,8 @@ std::vector<MixedJob> mixedJobs(int pages) {
                     [](const fs::path& root) {
                         std::string output = (root / "job1.impinfo").string();
                         return vorlan_scan_xmp((root / "scan.pdf").c_str(), output.data(), "False");
-                    }});
+                    },
+                    1, "job1.impinfo"});
     return jobs;
 }
 

@@ -15,6 +15,8 @@ struct MixedJob {
     std::string name;
     std::function<void(const std::filesystem::path& root)> prepare;  // writes the job's inputs
     std::function<int(const std::filesystem::path& root)> run;       // runs it; its result code
+    int expected = 0;                                                 // the result it should give
+    std::string writes;  // one file it must write, relative to its folder
 };
 
 // The four kinds of job; pages scales the PDFs (and the layer-mode ticket) to make jobs longer.
