@@ -2,12 +2,8 @@
 // inks and the XMP ink list, conversion of the found spot inks to layers, and separation
 // rewriting in keep-listed and drop-listed mode. Input and output are scratch files; at most
 // four distinct inks are used so that one execution stays short.
-#include <unistd.h>
-
 #include <algorithm>
 #include <cstdint>
-#include <cstdio>
-#include <cstdlib>
 #include <string>
 #include <vector>
 
@@ -16,40 +12,18 @@
 #include "pdf/separation_rewrite.h"
 #include "pdf/xmp_inks.h"
 #include "platform/os/text.h"
-
-namespace {
-
-std::string inputPath;
-std::string outputPath;
-
-std::string scratchFile(const char* pattern) {
-    std::string path = pattern;
-    int fd = mkstemp(path.data());
-    if (fd < 0) std::abort();
-    close(fd);
-    return path;
-}
-
-}  // namespace
+#include "scratch_file.h"
 
 extern "C" int LLVMFuzzerInitialize(int*, char***) {
     vorlan::os::ensureUtf8Locale();
-    inputPath = scratchFile("/tmp/vorlan-pdf-fuzz-in-XXXXXX");
-    outputPath = scratchFile("/tmp/vorlan-pdf-fuzz-out-XXXXXX");
-    std::atexit([] {
-        std::remove(inputPath.c_str());
-        std::remove(outputPath.c_str());
-    });
     return 0;
 }
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
-    FILE* file = std::fopen(inputPath.c_str(), "wb");
-    if (!file) return 0;
-    std::fwrite(data, 1, size, file);
-    std::fclose(file);
-    const char* in = inputPath.c_str();
-    const char* out = outputPath.c_str();
+    static const vorlan::fuzz::ScratchFile input("vorlan-pdf-fuzz-in"), output("vorlan-pdf-fuzz-out");
+    if (!input.write(data, size)) return 0;
+    const char* in = input.path();
+    const char* out = output.path();
 
     if (getPDFPageCount(nullptr, in) <= 0) return 0;
     double height = 0, width = 0;

@@ -5,32 +5,19 @@
 #include <qpdf/QPDFObjectHandle.hh>
 #include <qpdf/QPDFPageDocumentHelper.hh>
 #include <qpdf/QPDFWriter.hh>
-#include <unistd.h>
-
 #include <cstdint>
 #include <cstdio>
-#include <cstdlib>
 #include <string>
 #include <vector>
 
 #include "pdf/xmp_inks.h"
 #include "pdf/xmp_scan.h"
 #include "platform/os/text.h"
+#include "scratch_file.h"
 
 namespace {
 
-std::string pdfPath;
-std::string descriptionPath;
-
-std::string scratchFile(const char* pattern) {
-    std::string path = pattern;
-    int fd = mkstemp(path.data());
-    if (fd < 0) std::abort();
-    close(fd);
-    return path;
-}
-
-void writePdfWithPacket(const std::string& packet) {
+void writePdfWithPacket(const std::string& packet, const char* pdfPath) {
     QPDF pdf;
     pdf.emptyPDF();
     QPDFObjectHandle page = pdf.makeIndirectObject(
@@ -41,7 +28,7 @@ void writePdfWithPacket(const std::string& packet) {
     metadata.getDict().replaceKey("/Type", QPDFObjectHandle::newName("/Metadata"));
     metadata.getDict().replaceKey("/Subtype", QPDFObjectHandle::newName("/XML"));
     pdf.getRoot().replaceKey("/Metadata", metadata);
-    QPDFWriter writer(pdf, pdfPath.c_str());
+    QPDFWriter writer(pdf, pdfPath);
     writer.setStaticID(true);
     writer.write();
 }
@@ -50,22 +37,18 @@ void writePdfWithPacket(const std::string& packet) {
 
 extern "C" int LLVMFuzzerInitialize(int*, char***) {
     vorlan::os::ensureUtf8Locale();
-    pdfPath = scratchFile("/tmp/vorlan-xmp-fuzz-XXXXXX");
-    descriptionPath = scratchFile("/tmp/vorlan-xmp-fuzz-desc-XXXXXX");
-    std::atexit([] {
-        std::remove(pdfPath.c_str());
-        std::remove(descriptionPath.c_str());
-    });
     return 0;
 }
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
+    static const vorlan::fuzz::ScratchFile pdfFile("vorlan-xmp-fuzz");
+    static vorlan::fuzz::ScratchFile descriptionFile("vorlan-xmp-fuzz-description");
     const std::string packet(reinterpret_cast<const char*>(data), size);
     std::vector<XMPInk> inks;
     readXMPInks(packet.c_str(), inks);
 
-    writePdfWithPacket(packet);
-    std::remove(descriptionPath.c_str());
-    scanPdfInksToDescription(pdfPath.c_str(), descriptionPath.data(), false);
+    writePdfWithPacket(packet, pdfFile.path());
+    std::remove(descriptionFile.path());
+    scanPdfInksToDescription(pdfFile.path(), descriptionFile.mutablePath().data(), false);
     return 0;
 }
