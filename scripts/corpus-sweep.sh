@@ -34,6 +34,7 @@ settings=$(realpath fuzz/autoimpose/corpus/full.xml)
 
 runs=0
 findings=0
+declare -A statuses  # how many runs ended with each exit status
 # Runs one command in a fresh scratch folder; a sanitizer report or a crash counts as a finding.
 check() {
   local label="$1"
@@ -41,6 +42,7 @@ check() {
   runs=$((runs + 1))
   local status=0
   (cd "$work/run" && "$@") >"$work/out" 2>"$work/err" || status=$?
+  statuses[$status]=$((${statuses[$status]:-0} + 1))
   if [ "$status" -ge 99 ] || grep -qE 'ERROR: (Address|Leak)Sanitizer|runtime error:|SUMMARY: UndefinedBehaviorSanitizer' "$work/err"; then
     findings=$((findings + 1))
     echo "corpus-sweep: FINDING in $label (exit $status)" >&2
@@ -81,5 +83,7 @@ for pdf in "$corpus"/pdf/*.pdf; do
   check "rewrite-seps --drop $name" "$cli" rewrite-seps --drop "$spots" job1.pdf dropped.pdf
 done
 
-echo "corpus-sweep: $runs runs, $findings with sanitizer findings"
+summary=""
+for status in $(printf '%s\n' "${!statuses[@]}" | sort -n); do summary+=" $status:${statuses[$status]}"; done
+echo "corpus-sweep: $runs runs (exit status:count$summary), $findings with sanitizer findings"
 [ "$findings" -eq 0 ]
