@@ -1,9 +1,11 @@
 // Throughput of jobs side by side: a mixed batch (layer mode with PDF conversion, spot mode, PDF
 // only, ink scan; `copies` of each) run on one thread, then on `threads` threads taking jobs from
-// one queue. Prints jobs per second for both and the speed-up, and fails (exit 1) below the goal
-// of 0.9 × threads (1.8 for two threads). The machine must have the cores free to meet it.
+// one queue; each the best of three passes. Prints jobs per second for both and the speed-up, and
+// fails (exit 1) below the goal of 0.9 × threads (1.8 for two threads). The machine must have the
+// cores free to meet it.
 //
-//     thread_bench [threads=2] [copies=4] [pages=40]
+//     thread_bench [threads=2] [copies=4] [pages=200]
+#include <algorithm>
 #include <atomic>
 #include <chrono>
 #include <cstdio>
@@ -59,7 +61,7 @@ double runBatch(const Batch& batch, int threads, const std::vector<int>& expecte
 int main(int argc, char** argv) {
     const int threads = argc > 1 ? std::atoi(argv[1]) : 2;
     const int copies = argc > 2 ? std::atoi(argv[2]) : 4;
-    const int pages = argc > 3 ? std::atoi(argv[3]) : 40;
+    const int pages = argc > 3 ? std::atoi(argv[3]) : 200;
     vorlan::test::TempDir tmp;
     prepareProcess(tmp.path());
 
@@ -74,8 +76,11 @@ int main(int argc, char** argv) {
     std::vector<int> expected;
     for (size_t i = 0; i < batch.jobs.size(); ++i) expected.push_back(batch.jobs[i].run(batch.folders[i]));
 
-    const double one = runBatch(batch, 1, expected);
-    const double many = runBatch(batch, threads, expected);
+    double one = 1e9, many = 1e9;
+    for (int pass = 0; pass < 3; ++pass) {
+        one = std::min(one, runBatch(batch, 1, expected));
+        many = std::min(many, runBatch(batch, threads, expected));
+    }
     const double jobs = static_cast<double>(batch.jobs.size());
     const double speedUp = one / many;
     std::printf("%zu jobs (%d pages each): 1 thread %.2f s (%.1f jobs/s), %d threads %.2f s (%.1f jobs/s), "
