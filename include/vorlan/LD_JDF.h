@@ -1,7 +1,8 @@
 // LD_JDF: the worker that processes one job, and the job model it holds.
 //
 // One worker serves one call of JDF_InitializeAndCreateNewJDF (or JDF_AutoImposition) on the
-// host's thread. Records are created with new and owned by one list each; the pipeline's last
+// host's thread. Workers share nothing: each may run on its own thread alongside others, but one
+// worker must not be used from two threads at once (see vorlan.h). Records are created with new and owned by one list each; the pipeline's last
 // step releases them, and the destructor releases whatever an early exit left behind.
 #pragma once
 

@@ -1,8 +1,17 @@
 /*
  * vorlan: job preparation for print servers.
  *
- * The C entry points a print server's job host calls, once per job, on its own thread.
- * Two jobs must not run at the same time in one process.
+ * The C entry points a print server's job host calls, once per job.
+ *
+ * Threads: the library keeps no process-wide mutable state, so different jobs may run at the same
+ * time on different threads of one process, through these entry points or through separate
+ * LD_JDF / JDFinterface workers; each writes what it would write alone. Each call runs on the
+ * calling thread and calls the host's callbacks there. What the host must keep apart: one worker
+ * object must not be used from two threads at once, and jobs running together must not share an
+ * output path (ticket, PDF names handed out by FilePathCallback, scan description) or write into
+ * the same job folder. Jobs with the same job number may run together (the job attribute store
+ * locks each job's file). The environment (VORLAN_JOB_STORE, VORLAN_HOME, SOURCE_DATE_EPOCH) is
+ * read during calls: set it before starting jobs, not while they run.
  */
 #ifndef VORLAN_H
 #define VORLAN_H

@@ -9,9 +9,6 @@
 
 namespace {
 
-// Sessions belong to the thread that started them, like every PDF call of one job.
-thread_local int runningSessions = 0;
-
 // The oldest qpdf release whose interfaces this code relies on.
 constexpr int kMinimumMajor = 11;
 
@@ -27,12 +24,7 @@ int startPDFLibrary() {
         debugMessage("failed on qpdf version " + version + "\n");
         return 1;
     }
-    ++runningSessions;
     return 0;
 }
 
-void stopPDFLibrary() {
-    if (runningSessions > 0) --runningSessions;
-}
-
-bool pdfLibraryRunning() { return runningSessions > 0; }
+void stopPDFLibrary() {}

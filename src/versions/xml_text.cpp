@@ -4,7 +4,7 @@
 
 #include "versions/xml_tree.h"
 
-char kvXmlEmptyText[1] = {'\0'};
+const char kvXmlEmptyText[1] = {'\0'};
 
 namespace {
 
@@ -47,7 +47,7 @@ std::string kvXmlBytes(const _kvXmlText* text) {
 
 // Each unit holds one byte of the UTF-8 text, so the copy gives those bytes back unchanged
 // (encoding the units themselves as characters would encode the text twice).
-char* kvXmlUtf8Copy(const _kvXmlText* text) {
+const char* kvXmlUtf8Copy(const _kvXmlText* text) {
     if (!text || text->length <= 0) return kvXmlEmptyText;
     auto* copy = static_cast<char*>(std::malloc(static_cast<size_t>(text->length) + 1));
     if (!copy) return kvXmlEmptyText;
@@ -56,6 +56,6 @@ char* kvXmlUtf8Copy(const _kvXmlText* text) {
     return copy;
 }
 
-void kvXmlFreeUtf8Copy(char* copy) {
-    if (copy != kvXmlEmptyText) std::free(copy);
+void kvXmlFreeUtf8Copy(const char* copy) {
+    if (copy != kvXmlEmptyText) std::free(const_cast<char*>(copy));
 }

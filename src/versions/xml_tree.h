@@ -87,10 +87,11 @@ _kvXmlNode* kvXmlFindChild(const _kvXmlNode* node, const char* name);
 std::string kvXmlBytes(const _kvXmlText* text);
 // The original UTF-8 bytes as a new zero-terminated malloc block, or the shared empty string
 // kvXmlEmptyText when the text is empty or the copy cannot be allocated. Release with
-// kvXmlFreeUtf8Copy, which leaves the shared empty string alone.
-char* kvXmlUtf8Copy(const _kvXmlText* text);
-void kvXmlFreeUtf8Copy(char* copy);
-extern char kvXmlEmptyText[1];
+// kvXmlFreeUtf8Copy, which leaves the shared empty string alone. The copy is read-only, so the
+// shared empty string is a constant that jobs on other threads can never see changed.
+const char* kvXmlUtf8Copy(const _kvXmlText* text);
+void kvXmlFreeUtf8Copy(const char* copy);
+extern const char kvXmlEmptyText[1];
 
 // ---- Ownership for C++ callers ------------------------------------------------------------------
 

@@ -16,23 +16,12 @@
 
 namespace fs = std::filesystem;
 using namespace layermode_test;
-using vorlan::test::TestPdf;
 
 namespace {
 
 const std::vector<std::string> kInks = {"Gold", "Silver", "CutContour"};
 
-// A PDF whose every page paints each ink in a square of its own, plus a CMYK square.
-void writeSpotPdf(const fs::path& file, int pages) {
-    TestPdf pdf;
-    std::string spaces, content = "0 0 0 1 k 10 10 20 20 re f\n";
-    for (size_t i = 0; i < kInks.size(); ++i) {
-        spaces += "/S" + std::to_string(i) + " " + pdf.separation(kInks[i]) + " ";
-        content += "/S" + std::to_string(i) + " cs 1 sc " + std::to_string(40 + 30 * i) + " 10 20 20 re f\n";
-    }
-    for (int p = 0; p < pages; ++p) pdf.addPage(content, "<< /ColorSpace << " + spaces + ">> >>");
-    pdf.write(file.string());
-}
+void writeSpotPdf(const fs::path& file, int pages) { vorlan::test::writeSpotPdf(file.string(), kInks, pages); }
 
 using Plates = std::map<std::string, long>;
 

@@ -58,6 +58,9 @@ struct TestInk {
 };
 std::string eskoXmp(const std::vector<TestInk>& inks);
 
+// Writes a PDF whose every page paints each ink in a square of its own, plus a CMYK square.
+void writeSpotPdf(const std::string& path, const std::vector<std::string>& inks, int pages);
+
 // A PDF name token for a decoded name (with #xx escapes where needed).
 std::string pdfName(const std::string& name);
 

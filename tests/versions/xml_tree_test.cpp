@@ -78,10 +78,10 @@ TEST(XmlTree, TextIsOneUnitPerUtf8Byte) {
     _kvXmlText* value = p.root()->firstAttribute->value;
     ASSERT_EQ(value->length, 5);
     EXPECT_EQ(value->text[5], 0);
-    char* copy = kvXmlUtf8Copy(value);
+    const char* copy = kvXmlUtf8Copy(value);
     EXPECT_STREQ(copy, "\xC3\x84\xE2\x82\xAC");
     kvXmlFreeUtf8Copy(copy);
-    char* empty = kvXmlUtf8Copy(p.root()->lastAttribute->value);
+    const char* empty = kvXmlUtf8Copy(p.root()->lastAttribute->value);
     EXPECT_EQ(empty, kvXmlEmptyText);
     kvXmlFreeUtf8Copy(empty);  // must not free the shared string
     EXPECT_EQ(kvXmlUtf8Copy(nullptr), kvXmlEmptyText);

@@ -1,7 +1,6 @@
 // Token tables of the enumerations the layer writes and reads.
 #include "platform/jdf/enum_tables.h"
 
-#include <mutex>
 #include <unordered_map>
 
 #include "platform/jdf/exception.h"
@@ -49,14 +48,29 @@ const wchar_t* const BandOrdering = L"Unknown,BandMajor,ColorMajor";
 
 namespace {
 
-// The tables are constants: each is split into its tokens once and kept.
-const vWString& tokensOf(const wchar_t* table) {
-    static std::mutex lock;
-    static std::unordered_map<const wchar_t*, vWString> split;
-    std::lock_guard<std::mutex> guard(lock);
+// Every table split into its tokens, built once on first use and never changed afterwards, so
+// threads read it without a lock.
+const std::unordered_map<const wchar_t*, vWString>& splitTables() {
+    static const std::unordered_map<const wchar_t*, vWString> split = [] {
+        std::unordered_map<const wchar_t*, vWString> tables;
+        for (const wchar_t* table :
+             {NodeActivation, NodeStatus, ResourceStatus, PartUsage, PartIDKey, ResourceClass, LinkUsage,
+              ProcessUsage, OCGDefault, OCGProcess, MediaType, GrainDirection, MediaUnit, Side, MetadataContext,
+              MetadataDataType, StackRestrictions, LogicalStackSequence, BaseOrdReset, RotatePolicy, SizePolicy,
+              BandOrdering})
+            tables.emplace(table, vWString(table, L","));
+        return tables;
+    }();
+    return split;
+}
+
+// The tokens of a table; a list that is not one of the tables above is split into `own`.
+const vWString& tokensOf(const wchar_t* table, vWString& own) {
+    const auto& split = splitTables();
     auto found = split.find(table);
-    if (found == split.end()) found = split.emplace(table, vWString(table, L",")).first;
-    return found->second;
+    if (found != split.end()) return found->second;
+    own = vWString(table, L",");
+    return own;
 }
 
 }  // namespace
@@ -64,7 +78,8 @@ const vWString& tokensOf(const wchar_t* table) {
 const WString& Token(const wchar_t* table, int n, bool allowUnknown) {
     if (n < 0 || (n == 0 && !allowUnknown))
         throw JDFException("enumeration value " + std::to_string(n) + " cannot be written");
-    const vWString& tokens = tokensOf(table);
+    vWString own;
+    const vWString& tokens = tokensOf(table, own);
     if (static_cast<size_t>(n) >= tokens.size())
         throw JDFException("enumeration value " + std::to_string(n) + " is out of range");
     return tokens[static_cast<size_t>(n)];
@@ -72,7 +87,8 @@ const WString& Token(const wchar_t* table, int n, bool allowUnknown) {
 
 int Number(const wchar_t* table, const WString& token) {
     if (token.empty()) return 0;
-    int i = tokensOf(table).index(token);
+    vWString own;
+    int i = tokensOf(table, own).index(token);
     return i < 0 ? 0 : i;
 }
 
