@@ -75,7 +75,7 @@ const vWString& tokensOf(const wchar_t* table, vWString& own) {
 
 }  // namespace
 
-const WString& Token(const wchar_t* table, int n, bool allowUnknown) {
+WString Token(const wchar_t* table, int n, bool allowUnknown) {
     if (n < 0 || (n == 0 && !allowUnknown))
         throw JDFException("enumeration value " + std::to_string(n) + " cannot be written");
     vWString own;

@@ -32,7 +32,7 @@ extern const wchar_t* const SizePolicy;            // 1 ClipToMaxPage, 3 FitToPa
 extern const wchar_t* const BandOrdering;
 
 // The token of number n; throws JDFException when n is out of range, or 0 and !allowUnknown.
-const WString& Token(const wchar_t* table, int n, bool allowUnknown = false);
+WString Token(const wchar_t* table, int n, bool allowUnknown = false);
 // The number of token, or 0 when the table does not hold it.
 int Number(const wchar_t* table, const WString& token);
 
