@@ -62,12 +62,7 @@ std::vector<PartText> partsOf(const TicketView& t) {
     return parts;
 }
 
-class LayoutInjection : public testing::Test {
-protected:
-    void SetUp() override { setenv("VORLAN_JOB_STORE", (tmp / "store").c_str(), 1); }
-    void TearDown() override { unsetenv("VORLAN_JOB_STORE"); }
-    vorlan::test::TempDir tmp;
-};
+using LayoutInjection = vorlan::test::JobStoreTest;
 
 }  // namespace
 

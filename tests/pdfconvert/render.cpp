@@ -24,25 +24,25 @@ long GreyImage::inked() const {
     return static_cast<long>(std::count_if(pixels.begin(), pixels.end(), [](unsigned char p) { return p < 245; }));
 }
 
-GreyImage renderPage(const std::string& pdf, int page, int dpi) {
+GreyImage renderPage(const std::string& pdf, int page, int dpi, bool mustRender) {
     GreyImage image;
-    if (!haveProgram("pdftoppm")) return image;
     TempDir dir;
     const std::string stem = (dir.path() / "r").string();
     const std::string cmd = "pdftoppm -gray -r " + std::to_string(dpi) + " -f " + std::to_string(page) + " -l " +
                             std::to_string(page) + " -singlefile '" + pdf + "' '" + stem + "' >/dev/null 2>&1";
-    if (runCommand(cmd) != 0) return image;
-    const std::string data = readFile(stem + ".pgm");
+    const std::string data = haveProgram("pdftoppm") && runCommand(cmd) == 0 ? readFile(stem + ".pgm") : "";
     std::istringstream in(data);
     std::string magic;
     int maxValue = 0;
     in >> magic >> image.width >> image.height >> maxValue;
     in.get();
-    if (magic != "P5" || image.width <= 0 || image.height <= 0) return GreyImage();
-    const size_t size = static_cast<size_t>(image.width) * static_cast<size_t>(image.height);
-    const size_t offset = static_cast<size_t>(in.tellg());
-    if (data.size() < offset + size) return GreyImage();
-    image.pixels.assign(data.begin() + static_cast<long>(offset), data.begin() + static_cast<long>(offset + size));
+    const size_t size = static_cast<size_t>(std::max(image.width, 0)) * static_cast<size_t>(std::max(image.height, 0));
+    const std::streamoff offset = in.tellg();
+    if (magic != "P5" || size == 0 || offset < 0 || data.size() < static_cast<size_t>(offset) + size) {
+        if (mustRender) ADD_FAILURE() << "pdftoppm could not render page " << page << " of " << pdf;
+        return GreyImage();
+    }
+    image.pixels.assign(data.begin() + offset, data.begin() + offset + static_cast<long>(size));
     return image;
 }
 
