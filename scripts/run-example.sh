@@ -26,6 +26,10 @@ echo "== job 2: a bare PDF with the same two versions"
   --impinfo "$example/job2.impinfo" --job-folder "$example" --out-dir "$example/out" \
   "$example/job2.pdf" "$example/bare.jdf" || status=$?
 
+echo "== proofs: one PDF per version of each ticket"
+"$vorlan" proof "$example/versioned.jdf" "$example/proofs" || status=$?
+"$vorlan" proof "$example/bare.jdf" "$example/proofs-bare" || status=$?
+
 if [ -f "$example/versioned.jdf" ]; then
   echo "---- $example/versioned.jdf (README: 'The example jobs and what their tickets say')"
   cat "$example/versioned.jdf"

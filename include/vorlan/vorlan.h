@@ -62,6 +62,27 @@ VORLAN_API int vorlan_autoimp(const char* settingsPath, const char* jdfPath, Pro
  * pages against the die library; any other text reads the Esko technical inks of the XMP. */
 VORLAN_API int vorlan_scan_xmp(const char* pdfPath, char* outputPath, const char* mode);
 
+/* One version's proof, as vorlan_proof_ticket reports it (texts valid during the callback). */
+typedef struct VorlanProofVersion {
+    const char* version; /* the version name; "Default" for surfaces and runs without one */
+    const char* path;    /* the proof PDF, OUTDIR/<version>.pdf with a safe file name */
+    int pages;           /* pages of the proof: one per printed surface */
+    int result;          /* LD_OK when written, else why not (an LDError) */
+    const char* message; /* empty when written, else the line saying what is missing */
+} VorlanProofVersion;
+typedef void (*ProofCallback)(const VorlanProofVersion* version, void* userData);
+
+/* Writes proof PDFs of a ticket this library wrote: for each version one PDF in outputFolder with
+ * one page per printed surface in sheet order (the sheet's media size; each placed object drawn
+ * from its logical page through its CTM, clipped to its ClipBox, with the content of groups its
+ * ordinal switches off left out; a label naming version, copies, sheet, side and content type).
+ * Job files are only read. Every version is reported through report (may be null); one that
+ * cannot be written leaves the others to be written. Returns LD_OK when all were written, else
+ * the first failure's code (LD_FILE_NOT_FOUND: a PDF is missing; LD_REFERENCE_OUT_OF_RANGE: a
+ * page is missing), or the ticket reader's code. */
+VORLAN_API int vorlan_proof_ticket(const char* ticketPath, const char* outputFolder, ProofCallback report,
+                                   void* userData);
+
 #ifdef __cplusplus
 }
 #endif

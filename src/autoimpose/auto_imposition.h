@@ -3,7 +3,7 @@
 // sizes, stacking, delivery options, sheet ranges), driven by an auto-impose settings file.
 #pragma once
 
-#include "autoimpose/settings.h"
+#include "settings.h"
 
 namespace vorlan::autoimpose {
 

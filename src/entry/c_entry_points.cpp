@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "entry/description_file.h"
+#include "pdf/proofs.h"
 #include "pdf/xmp_scan.h"
 #include "versions/valid_description.h"
 #include "vorlan/JDFinterface.h"
@@ -52,6 +53,15 @@ VORLAN_API int vorlan_scan_xmp(const char* pdfPath, char* outputPath, const char
     try {
         bool dieLibrary = mode && std::strcmp(mode, "True") == 0;
         return scanPdfInksToDescription(pdfPath, outputPath, dieLibrary);
+    } catch (...) {
+        return LD_FAILED;
+    }
+}
+
+VORLAN_API int vorlan_proof_ticket(const char* ticketPath, const char* outputFolder, ProofCallback report,
+                                   void* userData) {
+    try {
+        return vorlan::pdf::writeProofs(ticketPath, outputFolder, report, userData);
     } catch (...) {
         return LD_FAILED;
     }

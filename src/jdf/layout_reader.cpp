@@ -265,6 +265,7 @@ private:
         surface->isFront = side && std::strcmp(side, "Front") == 0;
         place(surface->isFront ? sheet.front : sheet.back, surface);
         w_.surfaces.push_back(surface);
+        w_.ticket->surfaceElements.push_back(element);
 
         if (!surface->SurfaceContentsBox) surface->SurfaceContentsBox = new LD_Box;  // made with the surface
         const char* contentsBox = inheritedAttribute(node, "SurfaceContentsBox");

@@ -29,6 +29,9 @@ struct LD_JDFHandles {
     // copies of a worker share them; the layout's release frees them.
     std::shared_ptr<std::vector<std::unique_ptr<LD_Surface>>> displacedSurfaces =
         std::make_shared<std::vector<std::unique_ptr<LD_Surface>>>();
+    // The element each surface of the surface list was read from, in that list's order (what the
+    // reader does not keep in the records, such as version tags, is read from there). Not copied.
+    std::vector<JDF::KElement> surfaceElements;
 
     LD_JDFHandles() = default;
     // Copies share the document; the parser stays with the original.

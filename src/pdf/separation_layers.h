@@ -3,13 +3,12 @@
 // already under optional content into the catch-all group "KVVersionSpecialOCGName".
 #pragma once
 
-#include <qpdf/QPDF.hh>
-
 #include <string>
 #include <vector>
 
-#include "pdf/pdf_failure.h"
+#include "pdf_failure.h"
 
+class QPDF;
 struct ZippedJDFFileSystem;
 
 namespace vorlan::pdf {

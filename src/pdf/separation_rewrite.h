@@ -13,7 +13,7 @@
 #include <string>
 #include <vector>
 
-#include "pdf/pdf_failure.h"
+#include "pdf_failure.h"
 
 class QPDF;
 struct ZippedJDFFileSystem;

@@ -19,7 +19,7 @@ int run(const std::string& arguments, std::string* output = nullptr) {
 }  // namespace
 
 TEST(Cli, EveryCommandHasHelp) {
-    for (const char* command : {"", "consume", "valid", "autoimpose", "scan-xmp", "job-attr"}) {
+    for (const char* command : {"", "consume", "valid", "autoimpose", "scan-xmp", "job-attr", "proof"}) {
         std::string output;
         EXPECT_EQ(run(std::string(command) + " --help", &output), 0) << command;
         EXPECT_NE(output.find("usage: vorlan"), std::string::npos) << command;
@@ -126,6 +126,14 @@ TEST(Cli, BundledExampleJobsGiveVersionedTickets) {
     EXPECT_NE(ticket.find("KAV_tkt:VersionName=\"English\""), std::string::npos);
     EXPECT_NE(ticket.find("KAV_tkt:VersionName=\"German\""), std::string::npos);
     EXPECT_NE(ticket.find("DieSheet"), std::string::npos);
+    // The proofs of both tickets: one file per version (the die sheets make "Default"), the job's
+    // files left as they were.
+    EXPECT_EQ(run("proof --json " + example + "/versioned.jdf " + example + "/proofs", &output), 0) << output;
+    EXPECT_EQ(run("proof " + example + "/bare.jdf " + example + "/proofs-bare", &output), 0) << output;
+    for (const char* proof : {"/proofs/English.pdf", "/proofs/German.pdf", "/proofs/Default.pdf",
+                              "/proofs-bare/English.pdf", "/proofs-bare/German.pdf"})
+        EXPECT_EQ(runCommand("qpdf --check " + example + proof + " >/dev/null"), 0) << proof;
+    EXPECT_EQ(vorlan::test::readFile(example + "/out/vorlan-output-1.pdf"), firstConverted);
     if (vorlan::test::corpusDir().empty()) return;
     EXPECT_TRUE(vorlan::test::filesFailingJdfSchema({example + "/versioned.jdf", example + "/bare.jdf"}, &output).empty())
         << output;

@@ -6,6 +6,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdlib>
 #include <cstdio>
 #include <sstream>
 
@@ -24,25 +25,62 @@ long GreyImage::inked() const {
     return static_cast<long>(std::count_if(pixels.begin(), pixels.end(), [](unsigned char p) { return p < 245; }));
 }
 
-GreyImage renderPage(const std::string& pdf, int page, int dpi, bool mustRender) {
-    GreyImage image;
+namespace {
+
+// pdftoppm's single-page output as a netpbm file of the wanted magic ("P5" grey, "P6" colour):
+// the size and the samples, or false.
+bool renderNetpbm(const std::string& pdf, int page, int dpi, bool colour, int& width, int& height,
+                  std::vector<unsigned char>& samples) {
+    if (!haveProgram("pdftoppm")) return false;
     TempDir dir;
     const std::string stem = (dir.path() / "r").string();
-    const std::string cmd = "pdftoppm -gray -r " + std::to_string(dpi) + " -f " + std::to_string(page) + " -l " +
-                            std::to_string(page) + " -singlefile '" + pdf + "' '" + stem + "' >/dev/null 2>&1";
-    const std::string data = haveProgram("pdftoppm") && runCommand(cmd) == 0 ? readFile(stem + ".pgm") : "";
+    const std::string cmd = std::string("pdftoppm ") + (colour ? "" : "-gray ") + "-r " + std::to_string(dpi) +
+                            " -f " + std::to_string(page) + " -l " + std::to_string(page) + " -singlefile '" + pdf +
+                            "' '" + stem + "' >/dev/null 2>&1";
+    if (runCommand(cmd) != 0) return false;
+    const std::string data = readFile(stem + (colour ? ".ppm" : ".pgm"));
     std::istringstream in(data);
     std::string magic;
     int maxValue = 0;
-    in >> magic >> image.width >> image.height >> maxValue;
+    in >> magic >> width >> height >> maxValue;
     in.get();
-    const size_t size = static_cast<size_t>(std::max(image.width, 0)) * static_cast<size_t>(std::max(image.height, 0));
-    const std::streamoff offset = in.tellg();
-    if (magic != "P5" || size == 0 || offset < 0 || data.size() < static_cast<size_t>(offset) + size) {
+    if (magic != (colour ? "P6" : "P5") || width <= 0 || height <= 0) return false;
+    const size_t size = static_cast<size_t>(width) * static_cast<size_t>(height) * (colour ? 3 : 1);
+    const size_t offset = static_cast<size_t>(in.tellg());
+    if (data.size() < offset + size) return false;
+    samples.assign(data.begin() + static_cast<long>(offset), data.begin() + static_cast<long>(offset + size));
+    return true;
+}
+
+}  // namespace
+
+GreyImage renderPage(const std::string& pdf, int page, int dpi, bool mustRender) {
+    GreyImage image;
+    if (!renderNetpbm(pdf, page, dpi, false, image.width, image.height, image.pixels)) {
         if (mustRender) ADD_FAILURE() << "pdftoppm could not render page " << page << " of " << pdf;
         return GreyImage();
     }
-    image.pixels.assign(data.begin() + offset, data.begin() + offset + static_cast<long>(size));
+    return image;
+}
+
+Rgb ColourImage::at(double x, double y, int dpi) const {
+    const int px = static_cast<int>(std::floor(x * dpi / 72.0));
+    const int py = height - 1 - static_cast<int>(std::floor(y * dpi / 72.0));
+    if (px < 0 || py < 0 || px >= width || py >= height) return {};
+    const size_t i = (static_cast<size_t>(py) * static_cast<size_t>(width) + static_cast<size_t>(px)) * 3;
+    return {rgb[i], rgb[i + 1], rgb[i + 2]};
+}
+
+long ColourImage::count(const Rgb& colour) const {
+    long n = 0;
+    for (size_t i = 0; i + 2 < rgb.size(); i += 3)
+        n += std::abs(rgb[i] - colour.r) < 40 && std::abs(rgb[i + 1] - colour.g) < 40 && std::abs(rgb[i + 2] - colour.b) < 40;
+    return n;
+}
+
+ColourImage renderColourPage(const std::string& pdf, int page, int dpi) {
+    ColourImage image;
+    if (!renderNetpbm(pdf, page, dpi, true, image.width, image.height, image.rgb)) return ColourImage();
     return image;
 }
 

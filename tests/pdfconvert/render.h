@@ -2,6 +2,7 @@
 // optional-content groups switched on.
 #pragma once
 
+#include <ostream>
 #include <string>
 #include <utility>
 #include <vector>
@@ -20,6 +21,24 @@ struct GreyImage {
 // and, unless the caller only probes (mustRender false), the calling test fails: no check can
 // pass on an image that was never rendered.
 GreyImage renderPage(const std::string& pdf, int page, int dpi = 36, bool mustRender = true);
+
+struct Rgb {
+    int r = -1, g = -1, b = -1;  // -1: outside the image
+    bool operator==(const Rgb& o) const { return r == o.r && g == o.g && b == o.b; }
+    friend std::ostream& operator<<(std::ostream& out, const Rgb& c) {
+        return out << "rgb(" << c.r << ", " << c.g << ", " << c.b << ")";
+    }
+};
+struct ColourImage {
+    int width = 0, height = 0;
+    std::vector<unsigned char> rgb;
+    // Colour at a point given in PDF units from the page's lower left corner.
+    Rgb at(double x, double y, int dpi) const;
+    // Pixels close to the colour (each channel within a tolerance).
+    long count(const Rgb& colour) const;
+};
+// Renders one page (1-based) in colour with pdftoppm; empty image when pdftoppm is missing or fails.
+ColourImage renderColourPage(const std::string& pdf, int page, int dpi = 36);
 
 // Writes a copy of `in` whose default configuration shows exactly the named groups (/ON) and
 // hides every other group of the document (/OFF). False on failure.

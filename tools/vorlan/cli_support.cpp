@@ -5,8 +5,7 @@
 #include <algorithm>
 #include <cstdio>
 
-#include "entry/result_codes.h"
-#include "platform/os/text.h"
+#include "host_api.h"
 
 namespace vorlan::cli {
 

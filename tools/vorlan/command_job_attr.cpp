@@ -4,7 +4,7 @@
 #include <string>
 
 #include "commands.h"
-#include "platform/jobstore/job_store.h"
+#include "host_api.h"
 
 namespace vorlan::cli {
 

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "autoimpose/auto_imposition.h"
+#include "host_api.h"
 #include "commands.h"
 #include "vorlan/vorlan.h"
 

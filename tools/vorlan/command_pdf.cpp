@@ -4,9 +4,7 @@
 #include <vector>
 
 #include "commands.h"
-#include "platform/os/text.h"
-#include "pdf/separation_layers.h"
-#include "pdf/separation_rewrite.h"
+#include "host_api.h"
 
 using vorlan::pdf::PdfFailure;
 

@@ -4,8 +4,7 @@
 #include <unistd.h>
 
 #include "commands.h"
-#include "entry/result_codes.h"
-#include "platform/os/text.h"
+#include "host_api.h"
 #include "vorlan/JDFinterface.h"
 
 namespace vorlan::cli {

@@ -13,5 +13,6 @@ int runJobAttr(Args args);
 int runInspect(Args args);
 int runConvertPdf(Args args);
 int runRewriteSeps(Args args);
+int runProof(Args args);
 
 }  // namespace vorlan::cli

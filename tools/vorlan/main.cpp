@@ -5,7 +5,7 @@
 
 #include "cli_support.h"
 #include "commands.h"
-#include "platform/os/text.h"
+#include "host_api.h"
 
 namespace {
 
@@ -22,6 +22,7 @@ void printUsage() {
         "  inspect     print what the query interface sees of a JDF ticket\n"
         "  convert-pdf put a PDF's separations into optional-content groups\n"
         "  rewrite-seps write a PDF variant that keeps or drops listed separations\n"
+        "  proof       write a proof PDF of every version of a ticket\n"
         "\n"
         "Run 'vorlan <command> --help' for a command's arguments. The exit status is the result code.");
 }
@@ -44,6 +45,7 @@ int main(int argc, char** argv) {
     if (command == "inspect") return vorlan::cli::runInspect(args);
     if (command == "convert-pdf") return vorlan::cli::runConvertPdf(args);
     if (command == "rewrite-seps") return vorlan::cli::runRewriteSeps(args);
+    if (command == "proof") return vorlan::cli::runProof(args);
     std::fprintf(stderr, "vorlan: unknown command '%s'\n\n", command.c_str());
     printUsage();
     return 2;
