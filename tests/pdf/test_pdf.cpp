@@ -14,9 +14,6 @@ std::string TestPdf::ref(QPDFObjectHandle object) {
     return std::to_string(object.getObjectID()) + " " + std::to_string(object.getGeneration()) + " R";
 }
 
-namespace {
-
-// A PDF name token for a decoded name (with #xx escapes where needed).
 std::string pdfName(const std::string& name) {
     std::string out = "/";
     for (unsigned char c : name) {
@@ -31,8 +28,6 @@ std::string pdfName(const std::string& name) {
     }
     return out;
 }
-
-}  // namespace
 
 QPDFObjectHandle TestPdf::object(const std::string& syntax) {
     return pdf_.makeIndirectObject(QPDFObjectHandle::parse(&pdf_, syntax));

@@ -58,4 +58,7 @@ struct TestInk {
 };
 std::string eskoXmp(const std::vector<TestInk>& inks);
 
+// A PDF name token for a decoded name (with #xx escapes where needed).
+std::string pdfName(const std::string& name);
+
 }  // namespace vorlan::test
