@@ -31,48 +31,37 @@ std::wstring wide(const fs::path& p) { return vorlan::os::widen(p.c_str()); }
 
 }  // namespace
 
-TEST(DataPathClassification, DataFileResolvesToItsFolder) {
-    TempDir dir;
-    fs::create_directory(dir / "job1D0001");
-    Classified c = classify((dir / "job1.0001").string());
-    EXPECT_EQ(c.kind, INPUT_FOLDER);
-    EXPECT_EQ(c.path, wide(dir / "job1D0001"));
-}
-
-TEST(DataPathClassification, BarePdfRecognisedByContentWhateverItsName) {
-    TempDir dir;
-    writeFile(dir / "artwork.bin", vorlan::test::minimalPdf());
-    Classified c = classify((dir / "artwork.bin").string());
-    EXPECT_EQ(c.kind, INPUT_PDF);
-    EXPECT_EQ(c.path, wide(dir / "artwork.bin"));
-}
-
-TEST(DataPathClassification, ResolvedPathThatIsAPdf) {
-    TempDir dir;
-    writeFile(dir / "dataDpdfX", "junk %PDF-1.4 later");
-    Classified c = classify((dir / "data.pdfX").string());
-    EXPECT_EQ(c.kind, INPUT_PDF);
-    EXPECT_EQ(c.path, wide(dir / "dataDpdfX"));
-}
-
-TEST(DataPathClassification, MissingAndUnknown) {
-    TempDir dir;
-    Classified missing = classify((dir / "nothing.0001").string());
-    EXPECT_EQ(missing.kind, INPUT_MISSING);
-
-    writeFile(dir / "textD0001", "just text");
-    Classified unknown = classify((dir / "text.0001").string());
-    EXPECT_EQ(unknown.kind, INPUT_UNKNOWN);
-    EXPECT_EQ(unknown.lastError, LD_FILE_NOT_FOUND);
-}
-
-TEST(DataPathClassification, ZeroByteBeforeMarkerIsNotAPdf) {
-    TempDir dir;
-    writeFile(dir / "nulD0001", std::string("ab\0cd%PDF-1.4", 13));
-    EXPECT_EQ(classify((dir / "nul.0001").string()).kind, INPUT_UNKNOWN);
-    // The marker must lie within the first 300 bytes.
-    writeFile(dir / "lateD0001", std::string(300, ' ') + "%PDF-1.4");
-    EXPECT_EQ(classify((dir / "late.0001").string()).kind, INPUT_UNKNOWN);
+// A data file resolves to its folder or is a PDF by content, whatever its name; a zero byte before
+// the marker, or a marker past the first 300 bytes, makes no PDF.
+TEST(DataPathClassification, KindAndResolvedPath) {
+    const struct {
+        const char* written;  // written first: a folder when bytes is empty, else a file
+        std::string bytes;
+        const char* dataFile;
+        InputDataFileTypes kind;
+        const char* resolved;  // checked when set
+    } cases[] = {
+        {"job1D0001", "", "job1.0001", INPUT_FOLDER, "job1D0001"},
+        {"artwork.bin", vorlan::test::minimalPdf(), "artwork.bin", INPUT_PDF, "artwork.bin"},
+        {"dataDpdfX", "junk %PDF-1.4 later", "data.pdfX", INPUT_PDF, "dataDpdfX"},
+        {nullptr, "", "nothing.0001", INPUT_MISSING, nullptr},
+        {"textD0001", "just text", "text.0001", INPUT_UNKNOWN, nullptr},
+        {"nulD0001", std::string("ab\0cd%PDF-1.4", 13), "nul.0001", INPUT_UNKNOWN, nullptr},
+        {"lateD0001", std::string(300, ' ') + "%PDF-1.4", "late.0001", INPUT_UNKNOWN, nullptr},
+    };
+    for (const auto& c : cases) {
+        TempDir dir;
+        if (c.bytes.empty() && c.written) fs::create_directory(dir / c.written);
+        else if (c.written) writeFile(dir / c.written, c.bytes);
+        Classified got = classify((dir / c.dataFile).string());
+        EXPECT_EQ(got.kind, c.kind) << c.dataFile;
+        if (c.resolved) {
+            EXPECT_EQ(got.path, wide(dir / c.resolved)) << c.dataFile;
+        }
+        if (c.kind == INPUT_UNKNOWN) {
+            EXPECT_EQ(got.lastError, LD_FILE_NOT_FOUND) << c.dataFile;
+        }
+    }
 }
 
 TEST(DataPathClassification, ShortPathsAreNeverWrittenBeforeTheirStart) {

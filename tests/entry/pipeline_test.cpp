@@ -10,67 +10,65 @@
 
 namespace fs = std::filesystem;
 using vorlan::jobstore::JobAttributeStore;
-using vorlan::test::TempDir;
 using vorlan::test::writeFile;
 
 namespace {
 
-class Pipeline : public testing::Test {
+class Pipeline : public vorlan::test::JobStoreTest {
 protected:
-    void SetUp() override { setenv("VORLAN_JOB_STORE", (jobs / "store").c_str(), 1); }
-    void TearDown() override { unsetenv("VORLAN_JOB_STORE"); }
-
     // Runs a job through the C entry point.
     int consume(const fs::path& dataFile, const std::string& description = "", const char* pageRange = "All") {
         std::string impinfo;
         if (!description.empty()) {
-            impinfo = (jobs / "job5.impinfo").string();
+            impinfo = (tmp / "job5.impinfo").string();
             writeFile(impinfo, description);
         }
-        std::string output = (jobs / "out.jdf").string();
+        std::string output = (tmp / "out.jdf").string();
         return vorlan_consume_job(dataFile.c_str(), impinfo.empty() ? nullptr : impinfo.c_str(), output.data(),
-                                  jobs.path().c_str(), pageRange, nullptr, nullptr, nullptr);
+                                  tmp.path().c_str(), pageRange, nullptr, nullptr, nullptr);
     }
 
-    TempDir jobs;
+    // Runs the worker's entry directly, into an output folder that does not exist.
+    LDError create(JDFinterface& job, const char* dataFile, const char* pageRange = "All") {
+        char output[] = "/nonexistent-folder/out.jdf";
+        std::string data = (tmp / dataFile).string();
+        return job.JDF_InitializeAndCreateNewJDF(output, nullptr, 0, data.c_str(), tmp.path().c_str(), pageRange, 5);
+    }
 };
 
 }  // namespace
 
 TEST_F(Pipeline, MissingDataFileGivesInvalidInput) {
     testing::internal::CaptureStderr();
-    EXPECT_EQ(consume(jobs / "nothing.0001"), LD_INVALID_INPUT);
+    EXPECT_EQ(consume(tmp / "nothing.0001"), LD_INVALID_INPUT);
     std::string said = testing::internal::GetCapturedStderr();
     EXPECT_EQ(said, "Invalid or absent xml buffer file, continuing as unversioned job... \n");  // once
 }
 
 TEST_F(Pipeline, ExistingFileOfUnknownKindGivesInvalidInput) {
-    writeFile(jobs / "textD0001", "plain text");
+    writeFile(tmp / "textD0001", "plain text");
     JDFinterface job(nullptr, nullptr, nullptr);
-    char output[] = "/nonexistent/out.jdf";
-    std::string data = (jobs / "text.0001").string();
-    EXPECT_EQ(job.JDF_InitializeAndCreateNewJDF(output, nullptr, 0, data.c_str(), jobs.path().c_str(), "All", 5),
-              LD_INVALID_INPUT);
+    EXPECT_EQ(create(job, "text.0001"), LD_INVALID_INPUT);
     EXPECT_EQ(job.JDF_GetLastErrorCode(), LD_INVALID_INPUT);
 }
 
 TEST_F(Pipeline, FolderWithNeitherTicketNorPdfGivesFileNotFound) {
-    fs::create_directories(jobs / "job5D0001");
-    writeFile(jobs / "job5D0001" / "readme.txt", "nothing to print");
-    EXPECT_EQ(consume(jobs / "job5.0001"), LD_FILE_NOT_FOUND);
+    fs::create_directories(tmp / "job5D0001");
+    writeFile(tmp / "job5D0001" / "readme.txt", "nothing to print");
+    EXPECT_EQ(consume(tmp / "job5.0001"), LD_FILE_NOT_FOUND);
 }
 
 TEST_F(Pipeline, EveryRunMarksTheDieUndefinedFirst) {
-    JobAttributeStore store(jobs / "store");
+    JobAttributeStore store(tmp / "store");
     ASSERT_TRUE(store.open());
     ASSERT_TRUE(store.set(5, "KVDieDefined", "True"));
-    fs::create_directories(jobs / "job5D0001");
-    consume(jobs / "job5.0001", "<OptionalContentGroupData/>");
+    fs::create_directories(tmp / "job5D0001");
+    consume(tmp / "job5.0001", "<OptionalContentGroupData/>");
     EXPECT_EQ(store.get(5, "KVDieDefined"), "False");
 }
 
 TEST_F(Pipeline, NullArgumentsFailCleanly) {
-    std::string output = (jobs / "out.jdf").string();
+    std::string output = (tmp / "out.jdf").string();
     EXPECT_EQ(vorlan_consume_job(nullptr, nullptr, output.data(), nullptr, nullptr, nullptr, nullptr, nullptr),
               LD_FAILED);
     EXPECT_FALSE(vorlan_is_valid_job(nullptr));
@@ -79,16 +77,16 @@ TEST_F(Pipeline, NullArgumentsFailCleanly) {
 }
 
 TEST_F(Pipeline, MalformedDescriptionStopsTheJob) {
-    fs::create_directories(jobs / "job5D0001");
-    writeFile(jobs / "job5D0001" / "art.pdf", vorlan::test::minimalPdf());
-    EXPECT_EQ(consume(jobs / "job5.0001", "<OptionalContentGroupData><unclosed>"), LD_FAILED);
+    fs::create_directories(tmp / "job5D0001");
+    writeFile(tmp / "job5D0001" / "art.pdf", vorlan::test::minimalPdf());
+    EXPECT_EQ(consume(tmp / "job5.0001", "<OptionalContentGroupData><unclosed>"), LD_FAILED);
 }
 
 TEST_F(Pipeline, EarlyExitLeavesNothingToLeak) {
     // A description that is read and then a PDF that is missing: records made so far are released
     // by the worker's destructor (LeakSanitizer checks this in the sanitizer build).
-    fs::create_directories(jobs / "job5D0001");
-    EXPECT_EQ(consume(jobs / "job5.0001",
+    fs::create_directories(tmp / "job5D0001");
+    EXPECT_EQ(consume(tmp / "job5.0001",
                       "<OptionalContentGroupData DefaultLayerMode='true'><DieCut enable='true'>"
                       "<Surface index='0' dieSepInternalNames='Die'/></DieCut></OptionalContentGroupData>"),
               LD_FILE_NOT_FOUND);
@@ -124,34 +122,29 @@ std::string ticketNaming(const std::string& pdfUrl) {
 }  // namespace
 
 TEST_F(Pipeline, TicketNamingAMissingPdfGivesFileNotFound) {
-    writeFile(jobs / "job5D0001" / "ticket.jdf", ticketNaming("art.pdf"));
-    EXPECT_EQ(consume(jobs / "job5.0001", "<OptionalContentGroupData DefaultLayerMode='true'/>"), LD_FILE_NOT_FOUND);
+    writeFile(tmp / "job5D0001" / "ticket.jdf", ticketNaming("art.pdf"));
+    EXPECT_EQ(consume(tmp / "job5.0001", "<OptionalContentGroupData DefaultLayerMode='true'/>"), LD_FILE_NOT_FOUND);
     // The surfaces were counted before the PDFs were looked for.
-    EXPECT_EQ(vorlan::test::readFile(jobs / "job5.dieinfo"), "OrigPageCount=2\r\n");
+    EXPECT_EQ(vorlan::test::readFile(tmp / "job5.dieinfo"), "OrigPageCount=2\r\n");
 }
 
 TEST_F(Pipeline, PercentTwentyUrlFindsTheFileInASubFolder) {
-    writeFile(jobs / "job5D0001" / "ticket.jdf", ticketNaming("file:///elsewhere/Page%201.pdf"));
-    writeFile(jobs / "job5D0001" / "pdfs" / "Page 1.pdf", vorlan::test::minimalPdf());
+    writeFile(tmp / "job5D0001" / "ticket.jdf", ticketNaming("file:///elsewhere/Page%201.pdf"));
+    writeFile(tmp / "job5D0001" / "pdfs" / "Page 1.pdf", vorlan::test::minimalPdf());
     JDFinterface job(nullptr, nullptr, nullptr);
-    char output[] = "/nonexistent-folder/out.jdf";
-    std::string data = (jobs / "job5.0001").string();
     // No description and no ticket-less path: the job leaves after the PDFs were found.
-    job.JDF_InitializeAndCreateNewJDF(output, nullptr, 0, data.c_str(), jobs.path().c_str(), "All", 5);
+    create(job, "job5.0001");
     EXPECT_NE(job.JDF_GetLastErrorCode(), LD_FILE_NOT_FOUND);
 }
 
 TEST_F(Pipeline, OnlyTheExactValueTrueSetsTheDieFlags) {
-    JobAttributeStore store(jobs / "store");
+    JobAttributeStore store(tmp / "store");
     ASSERT_TRUE(store.open());
     ASSERT_TRUE(store.set(5, "KVPrintDieLine", "true"));
     ASSERT_TRUE(store.set(5, "KVAutoDieControl", "True"));
-    fs::create_directories(jobs / "job5D0001");
+    fs::create_directories(tmp / "job5D0001");
     JDFinterface job(nullptr, nullptr, nullptr);
-    char output[] = "/nonexistent-folder/out.jdf";
-    std::string data = (jobs / "job5.0001").string();
-    EXPECT_EQ(job.JDF_InitializeAndCreateNewJDF(output, nullptr, 0, data.c_str(), jobs.path().c_str(), "all", 5),
-              LD_FILE_NOT_FOUND);
+    EXPECT_EQ(create(job, "job5.0001", "all"), LD_FILE_NOT_FOUND);
     EXPECT_FALSE(job.worker()->printDieLine);
     EXPECT_TRUE(job.worker()->autoDieControl);
     EXPECT_EQ(job.worker()->pageRangeMode, 3);  // page-range texts are exact: "all" is a page list

@@ -22,57 +22,44 @@ struct ClipPath {
     }
 };
 
-TEST(GeometryStrings, BoxTakesFourNumbersAndCyclesThroughFurtherOnes) {
-    LD_Box box;
-    LD_JDF::parseStringAsBox(L"0 0 612 792", &box);
-    EXPECT_EQ(box.lowerLeft.x, 0);
-    EXPECT_EQ(box.upperRight.x, 612);
-    EXPECT_EQ(box.upperRight.y, 792);
-
-    LD_Box shortBox;
-    LD_JDF::parseStringAsBox(L"1 2 3", &shortBox);
-    EXPECT_EQ(shortBox.lowerLeft.x, -1);
-    EXPECT_EQ(shortBox.upperRight.y, -1);
-
-    LD_Box longBox;
-    LD_JDF::parseStringAsBox(L"1 2 3 4 5", &longBox);
-    EXPECT_EQ(longBox.lowerLeft.x, 5);
-    EXPECT_EQ(longBox.upperRight.y, 4);
-    EXPECT_EQ(box.text, nullptr);  // the parser never sets the text
-}
-
-TEST(GeometryStrings, OnlySingleSpacesSeparateNumbers) {
-    LD_Box box;
-    LD_JDF::parseStringAsBox(L"1  2   3 4", &box);
-    EXPECT_EQ(box.lowerLeft.y, 2);
-    EXPECT_EQ(box.upperRight.x, 3);
+TEST(GeometryStrings, BoxesMatricesAndPoints) {
+    // Four numbers make a box, fewer leave it unset (-1), further ones cycle through the corners;
+    // only single spaces separate numbers.
+    const struct {
+        const wchar_t* text;
+        double llx, lly, urx, ury;
+    } boxes[] = {
+        {L"0 0 612 792", 0, 0, 612, 792},
+        {L"1 2 3", -1, -1, -1, -1},
+        {L"1 2 3 4 5", 5, 2, 3, 4},
+        {L"1  2   3 4", 1, 2, 3, 4},
+    };
+    for (const auto& c : boxes) {
+        LD_Box box;
+        LD_JDF::parseStringAsBox(c.text, &box);
+        EXPECT_EQ((std::vector<double>{box.lowerLeft.x, box.lowerLeft.y, box.upperRight.x, box.upperRight.y}),
+                  (std::vector<double>{c.llx, c.lly, c.urx, c.ury}))
+            << JDF::WString(c.text).getUTF8();
+        EXPECT_EQ(box.text, nullptr);  // the parser never sets the text
+    }
     std::unique_ptr<std::vector<double>> numbers(LD_JDF::splitIntoFloatTokensBySpace(L"10\t20 30"));
-    ASSERT_EQ(numbers->size(), 2u);  // the tab joins two numbers into one token, read as 10
-    EXPECT_EQ((*numbers)[0], 10);
-    EXPECT_EQ((*numbers)[1], 30);
+    EXPECT_EQ(*numbers, (std::vector<double>{10, 30}));  // the tab joins two numbers into one token, read as 10
     std::unique_ptr<std::vector<double>> odd(LD_JDF::splitIntoFloatTokensBySpace(L"abc -2.5e1 +3"));
     EXPECT_EQ(*odd, (std::vector<double>{0, -25, 3}));
-}
 
-TEST(GeometryStrings, MatrixNeedsSixNumbersAndIgnoresMore) {
-    LD_CTM ctm;
+    // A matrix needs six numbers and ignores more.
+    LD_CTM ctm, identity;
     LD_JDF::parseStringAsCTM(L"1 0 0 1 10 20 30", &ctm);
-    EXPECT_EQ(ctm.e, 10);
-    EXPECT_EQ(ctm.f, 20);
-    LD_CTM identity;
     LD_JDF::parseStringAsCTM(L"2 0 0 2 5", &identity);
-    EXPECT_EQ(identity.a, 1);
-    EXPECT_EQ(identity.e, 0);
-}
+    EXPECT_EQ((std::vector<double>{ctm.e, ctm.f, identity.a, identity.e}), (std::vector<double>{10, 20, 1, 0}));
 
-TEST(GeometryStrings, PointsComeInPairs) {
+    // Points come in pairs; an odd number is left out.
     std::vector<LD_Point*> points;
     LD_JDF::parseStringAsPoints(L"10 20 30", points);
+    LD_JDF::parseStringAsPoints(L"7", points);
     ASSERT_EQ(points.size(), 1u);
     EXPECT_EQ(points[0]->x, 10);
     EXPECT_EQ(points[0]->y, 20);
-    LD_JDF::parseStringAsPoints(L"7", points);
-    EXPECT_EQ(points.size(), 1u);
     for (auto* p : points) delete p;
 }
 
@@ -135,20 +122,13 @@ TEST(GeometryStrings, CloneCopiesNumbersAndTexts) {
     ASSERT_NE(typed.point3.text, nullptr);
     EXPECT_NE(typed.point3.text, original.point3.text);
     EXPECT_STREQ(typed.point3.text, L"3 4");
-    LD_ClipPathOperandsOnePointWidthHeight fresh;
-    EXPECT_EQ(fresh.width, 0);
-    EXPECT_EQ(fresh.point1.y, -1);
 }
 
 TEST(GeometryStrings, MarkPresentInAnyCase) {
-    EXPECT_TRUE(LD_JDF::isMarkPresent(L"Marks"));
-    EXPECT_TRUE(LD_JDF::isMarkPresent(L"cropmark.pdf"));
-    EXPECT_TRUE(LD_JDF::isMarkPresent(L"MMARK"));
-    EXPECT_TRUE(LD_JDF::isMarkPresent(L"xMaRkx"));
-    EXPECT_FALSE(LD_JDF::isMarkPresent(L""));
-    EXPECT_FALSE(LD_JDF::isMarkPresent(L"ma rk"));
-    EXPECT_FALSE(LD_JDF::isMarkPresent(L"mar"));
-    EXPECT_FALSE(LD_JDF::isMarkPresent(nullptr));
+    for (const wchar_t* text : {L"Marks", L"cropmark.pdf", L"MMARK", L"xMaRkx"})
+        EXPECT_TRUE(LD_JDF::isMarkPresent(text)) << JDF::WString(text).getUTF8();
+    for (const wchar_t* text : {L"", L"ma rk", L"mar", static_cast<const wchar_t*>(nullptr)})
+        EXPECT_FALSE(LD_JDF::isMarkPresent(text)) << (text ? JDF::WString(text).getUTF8() : "null");
 }
 
 }  // namespace

@@ -17,39 +17,25 @@ std::string surface(const std::string& side, const std::string& objects = "") {
 
 std::string content(int ord) { return R"(<ContentObject CTM="1 0 0 1 0 0" Ord=")" + std::to_string(ord) + R"("/>)"; }
 
-// Two signatures of two and three sheets, each sheet with a front and a back.
-std::string nestedLayout() {
-    std::string layout = R"(<Layout ID="L" Class="Parameter" Status="Available">)";
+// Two signatures of two and three sheets, each sheet with a front and a back: nested, or as a
+// Layout partitioned by SignatureName, SheetName and Side.
+std::string twoSignatureLayout(bool partitioned) {
+    std::string layout = R"(<Layout ID="L" Class="Parameter" Status="Available")" +
+                         std::string(partitioned ? R"( PartIDKeys="SignatureName SheetName Side">)" : ">");
     int ord = 0;
     for (int s = 0; s < 2; ++s) {
-        layout += R"(<Signature Name="Sig)" + std::to_string(s) + "\">";
-        for (int sheet = 0; sheet < 2 + s; ++sheet) {
-            layout += R"(<Sheet Name="Sh)" + std::to_string(s) + std::to_string(sheet) + "\">";
-            layout += surface("Front", content(ord)) + surface("Back", content(ord + 1));
-            ord += 2;
-            layout += "</Sheet>";
+        const std::string signature = "Sig" + std::to_string(s);
+        layout += partitioned ? "<Layout SignatureName=\"" + signature + "\">" : "<Signature Name=\"" + signature + "\">";
+        for (int sheet = 0; sheet < 2 + s; ++sheet, ord += 2) {
+            const std::string name = "Sh" + std::to_string(s) + std::to_string(sheet);
+            if (partitioned)
+                layout += R"(<Layout SheetName=")" + name + R"(" SurfaceContentsBox="0 0 612 792"><Layout Side="Front">)" +
+                          content(ord) + R"(</Layout><Layout Side="Back">)" + content(ord + 1) + "</Layout></Layout>";
+            else
+                layout += "<Sheet Name=\"" + name + "\">" + surface("Front", content(ord)) +
+                          surface("Back", content(ord + 1)) + "</Sheet>";
         }
-        layout += "</Signature>";
-    }
-    return layout + "</Layout>";
-}
-
-// The same tree as a Layout partitioned by SignatureName, SheetName and Side.
-std::string partitionedLayout() {
-    std::string layout =
-        R"(<Layout ID="L" Class="Parameter" Status="Available" PartIDKeys="SignatureName SheetName Side">)";
-    int ord = 0;
-    for (int s = 0; s < 2; ++s) {
-        layout += R"(<Layout SignatureName="Sig)" + std::to_string(s) + "\">";
-        for (int sheet = 0; sheet < 2 + s; ++sheet) {
-            layout += R"(<Layout SheetName="Sh)" + std::to_string(s) + std::to_string(sheet) +
-                      R"(" SurfaceContentsBox="0 0 612 792">)";
-            layout += R"(<Layout Side="Front">)" + content(ord) + R"(</Layout><Layout Side="Back">)" +
-                      content(ord + 1) + "</Layout>";
-            ord += 2;
-            layout += "</Layout>";
-        }
-        layout += "</Layout>";
+        layout += partitioned ? "</Layout>" : "</Signature>";
     }
     return layout + "</Layout>";
 }
@@ -82,12 +68,12 @@ void expectTwoSignatureTree(LD_JDF& w) {
 }
 
 TEST(LayoutReader, NestedAndPartitionedLayoutsGiveTheSameTree) {
-    ReadTicket nested(jdfTicket(nestedLayout(), kLayoutLink));
-    ASSERT_EQ(nested.result, LD_OK);
-    expectTwoSignatureTree(*nested);
-    ReadTicket partitioned(jdfTicket(partitionedLayout(), kLayoutLink));
-    ASSERT_EQ(partitioned.result, LD_OK);
-    expectTwoSignatureTree(*partitioned);
+    for (bool partitioned : {false, true}) {
+        SCOPED_TRACE(partitioned ? "partitioned" : "nested");
+        ReadTicket t(jdfTicket(twoSignatureLayout(partitioned), kLayoutLink));
+        ASSERT_EQ(t.result, LD_OK);
+        expectTwoSignatureTree(*t);
+    }
 }
 
 TEST(LayoutReader, RepeatedOrdsAreFlaggedOnEveryOccurrence) {

@@ -36,7 +36,6 @@ struct ReadTicket {
     std::string path;
     std::unique_ptr<LD_JDF> worker = std::make_unique<LD_JDF>();
     LDError result = LD_OK;
-    std::string output;  // what the reader printed
 
     explicit ReadTicket(const std::string& xml, bool jobHasTicket = false, const char* outputJdf = nullptr) {
         path = (dir / "ticket.jdf").string();
@@ -45,7 +44,7 @@ struct ReadTicket {
         worker->outputJdfPath = const_cast<char*>(outputJdf);
         ::testing::internal::CaptureStdout();
         result = worker->JDF_InitializeAndParseJDF(path.c_str());
-        output = ::testing::internal::GetCapturedStdout();
+        ::testing::internal::GetCapturedStdout();  // the reader's timing line
     }
     LD_JDF& operator*() { return *worker; }
     LD_JDF* operator->() { return worker.get(); }

@@ -8,7 +8,6 @@
 
 #include "job_builder.h"
 #include "jobpaths/layout_injection.h"
-#include "test_pdf.h"
 #include "test_support.h"
 #include "ticket_view.h"
 
@@ -44,9 +43,7 @@ Job writeJob(const fs::path& root, const std::string& ticket) {
 }
 
 void writePdf(const fs::path& file, int pages) {
-    vorlan::test::TestPdf pdf;
-    for (int p = 0; p < pages; ++p) pdf.addPage("0 0 m 10 10 l S");
-    pdf.write(file.string());
+    vorlan::test::writeFile(file, vorlan::test::minimalPdf("0 0 m 10 10 l S", pages));
 }
 
 // What one part of the written run list shows: file name, Pages, NPage, content type.
@@ -62,12 +59,7 @@ std::vector<PartText> partsOf(const TicketView& t) {
     return parts;
 }
 
-class LayoutInjection : public testing::Test {
-protected:
-    void SetUp() override { setenv("VORLAN_JOB_STORE", (tmp / "store").c_str(), 1); }
-    void TearDown() override { unsetenv("VORLAN_JOB_STORE"); }
-    vorlan::test::TempDir tmp;
-};
+using LayoutInjection = vorlan::test::JobStoreTest;
 
 }  // namespace
 

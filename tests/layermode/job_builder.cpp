@@ -220,14 +220,8 @@ void setJobAttribute(const char* name, const char* value) {
 }
 
 std::string schemaErrors(const std::vector<fs::path>& tickets) {
-    fs::path xsd = vorlan::test::corpusDir() / "jdf-schema" / "xmllint-patched" / "JDF_1.8" / "JDF.xsd";
-    if (!fs::exists(xsd)) return "schema not found: " + xsd.string();
-    if (!vorlan::test::haveProgram("xmllint")) return "xmllint (libxml2-utils) is needed to check the schema";
-    std::string files;
-    for (const fs::path& t : tickets) files += " '" + t.string() + "'";
-    std::string output;
-    int rc = vorlan::test::runCommand("xmllint --noout --schema '" + xsd.string() + "'" + files + " 2>&1", &output);
-    return rc == 0 ? std::string() : output;
+    std::string report;
+    return vorlan::test::filesFailingJdfSchema(tickets, &report).empty() ? std::string() : report;
 }
 
 }  // namespace layermode_test

@@ -54,9 +54,12 @@ bool renderNetpbm(const std::string& pdf, int page, int dpi, bool colour, int& w
 
 }  // namespace
 
-GreyImage renderPage(const std::string& pdf, int page, int dpi) {
+GreyImage renderPage(const std::string& pdf, int page, int dpi, bool mustRender) {
     GreyImage image;
-    if (!renderNetpbm(pdf, page, dpi, false, image.width, image.height, image.pixels)) return GreyImage();
+    if (!renderNetpbm(pdf, page, dpi, false, image.width, image.height, image.pixels)) {
+        if (mustRender) ADD_FAILURE() << "pdftoppm could not render page " << page << " of " << pdf;
+        return GreyImage();
+    }
     return image;
 }
 

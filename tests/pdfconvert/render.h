@@ -17,8 +17,10 @@ struct GreyImage {
     long inked() const;  // pixels darker than near-white
 };
 
-// Renders one page (1-based) with pdftoppm; empty image when pdftoppm is missing or fails.
-GreyImage renderPage(const std::string& pdf, int page, int dpi = 36);
+// Renders one page (1-based) with pdftoppm. When pdftoppm is missing or fails the image is empty
+// and, unless the caller only probes (mustRender false), the calling test fails: no check can
+// pass on an image that was never rendered.
+GreyImage renderPage(const std::string& pdf, int page, int dpi = 36, bool mustRender = true);
 
 struct Rgb {
     int r = -1, g = -1, b = -1;  // -1: outside the image
