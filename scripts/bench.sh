@@ -22,6 +22,7 @@ benchmarks=(
   "reader|$bin/jdf/reader_bench|ticket reader: <= 2.5x the JDF layer's parse (fresh process); 10x the ticket in <= 10.5x the time"
   "jdflayer|$bin/jdflayer/jdflayer_bench|JDF layer parse + write: <= 1.3x the time and <= 1.5x the memory of pugixml"
   "pdfconvert|$bin/pdfconvert/pdfconvert_bench|conversion and separation rewriting against qpdf --linearize --recompress-flate"
+  "threads|$bin/concurrency/thread_bench|jobs side by side: 2 threads >= 1.8x the throughput of one on a mixed batch (needs both cores free)"
   "pdfink|$bin/pdf/pdf_ink_bench|page-ink scan: <= 1.5x the time of qpdf --check"
   "description|$bin/versions/description_bench|version descriptions: throughput and peak memory (for information)"
   "autodescription|$bin/versions/auto_description_bench|automatic description: cost per surface stays flat (for information)"
