@@ -140,26 +140,40 @@ private:
     // The Dimension of the Media nearest the surface: a Media or MediaRef child of the surface
     // element or of an element enclosing it (sheet, signature, layout partitions). The reader's
     // media records hold only media typed as paper, so the ticket's own elements are asked.
-    bool mediaSize(const LD_Surface& surface, double& width, double& height) const {
+    bool mediaSize(const LD_Surface& surface, double& width, double& height) {
         const auto& elements = w_.ticket->surfaceElements;
         if (surface.index < 0 || static_cast<size_t>(surface.index) >= elements.size()) return false;
         const JDF::KElement& element = elements[static_cast<size_t>(surface.index)];
         for (pugi::xml_node n = element.node(); n; n = n.parent()) {
-            for (pugi::xml_node child = n.first_child(); child; child = child.next_sibling()) {
-                const char* local = jdf::localName(child);
-                JDF::KElement media(child, element.document());
-                if (std::strcmp(local, "MediaRef") == 0) media = JDF::JDFElement(media).GetTarget();
-                else if (std::strcmp(local, "Media") != 0) continue;
-                if (media.isNull() || !media.HasAttribute(L"Dimension")) continue;
-                const JDF::JDFXYPair dimension = JDF::JDFMedia(media).GetDimension();
-                if (dimension.GetX() > 0 && dimension.GetY() > 0) {
-                    width = dimension.GetX();
-                    height = dimension.GetY();
-                    return true;
-                }
+            const std::pair<double, double>& size = childMediaSize(n, element);
+            if (size.first > 0) {
+                width = size.first;
+                height = size.second;
+                return true;
             }
         }
         return false;
+    }
+
+    // The Dimension of the first Media (or MediaRef target) among n's children that has one;
+    // (0, 0) when none does. Remembered per element, since every surface of a sheet, signature
+    // or layout asks the same enclosing elements.
+    const std::pair<double, double>& childMediaSize(pugi::xml_node n, const JDF::KElement& element) {
+        auto [it, isNew] = childMedia_.try_emplace(n.internal_object(), 0.0, 0.0);
+        if (!isNew) return it->second;
+        for (pugi::xml_node child = n.first_child(); child; child = child.next_sibling()) {
+            const char* local = jdf::localName(child);
+            JDF::KElement media(child, element.document());
+            if (std::strcmp(local, "MediaRef") == 0) media = JDF::JDFElement(media).GetTarget();
+            else if (std::strcmp(local, "Media") != 0) continue;
+            if (media.isNull() || !media.HasAttribute(L"Dimension")) continue;
+            const JDF::JDFXYPair dimension = JDF::JDFMedia(media).GetDimension();
+            if (dimension.GetX() > 0 && dimension.GetY() > 0) {
+                it->second = {dimension.GetX(), dimension.GetY()};
+                break;
+            }
+        }
+        return it->second;
     }
 
     ProofPage page(const LD_Sheet& sheet, const LD_Surface& surface, const VersionTags& tags) {
@@ -243,6 +257,7 @@ private:
     fs::path folder_;
     TicketElements elements_;
     std::map<std::wstring, std::string> paths_;
+    std::map<const void*, std::pair<double, double>> childMedia_;  // see childMediaSize
 };
 
 }  // namespace
