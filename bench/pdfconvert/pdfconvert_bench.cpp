@@ -114,7 +114,12 @@ int main(int argc, char** argv) {
     const fs::path dir = fs::temp_directory_path() / ("vorlan-convert-bench-" + std::to_string(getpid()));
     fs::create_directories(dir);
     const fs::path in = dir / "in.pdf";
-    generate(in, pages, elements);
+    // Generated in a child: the measured children are forked from this process and start with its
+    // resident pages, which must not include the generator's heap.
+    if (runInChild([&] { generate(in, pages, elements); return 0; }).status != 0) {
+        std::fprintf(stderr, "pdfconvert_bench: could not generate %s\n", in.c_str());
+        return 1;
+    }
     std::printf("generated %s: %d pages x %d elements, %.1f MB\n", in.c_str(), pages, elements,
                 static_cast<double>(fs::file_size(in)) / 1e6);
 
