@@ -36,7 +36,7 @@ Resource runPartition(Resource& resource, int32_t ordinal) {
 // while the ticket is saved (the document then never holds them all; see KElement::DeferChildren).
 // Deferred partitions are out of reach of anything that walks the tree before the save.
 enum class PartitionWriting { InTree, Deferred };
-inline constexpr int32_t kDeferredPartitionBatch = 256;
+inline constexpr int32_t kDeferredPartitionBatch = 512;
 
 // Makes the Run partitions of ordinals 0 to count - 1 with makeOne(parent, k), which appends the
 // partition of ordinal k (or none) to parent. Deferred, makeOne runs during the save, so it and

@@ -29,6 +29,11 @@ void copyNamespaceDeclarations(pugi::xml_node from, pugi::xml_node to) {
     }
 }
 
+struct TextWriter : pugi::xml_writer {
+    std::string text;
+    void write(const void* data, size_t size) override { text.append(static_cast<const char*>(data), size); }
+};
+
 class DeferredChildrenWriter : public pugi::xml_writer {
 public:
     DeferredChildrenWriter(const DocumentState& state, pugi::xml_writer& out, unsigned flags)
@@ -86,16 +91,22 @@ private:
         if (number.empty() || *end != '\0' || index >= state_.deferred.size())
             throw JDFException("save: a deferred-children marker names no deferred children");
         const DeferredChildren& deferred = state_.deferred[index];
+        // One scratch document for every batch, emptied after each: its memory is reused.
+        auto scratch = std::make_shared<DocumentState>();
+        pugi::xml_node root = scratch->doc.append_child("Scratch");
+        copyNamespaceDeclarations(deferred.parent.parent(), root);
+        pugi::xml_node parent = root.append_child(deferred.parent.name());
         for (bool more = true; more;) {
-            auto scratch = std::make_shared<DocumentState>();
-            pugi::xml_node root = scratch->doc.append_child("Scratch");
-            copyNamespaceDeclarations(deferred.parent.parent(), root);
-            pugi::xml_node parent = root.append_child(deferred.parent.name());
+            parent.remove_attributes();
+            parent.remove_children();
             for (pugi::xml_attribute a : deferred.parent.attributes())
                 parent.append_attribute(a.name()).set_value(a.value());
             more = deferred.makeBatch(parent, scratch);
+            // pugixml flushes every printed node: collected first, a batch reaches the output in one write.
+            TextWriter text;
             for (pugi::xml_node child : parent.children())
-                child.print(out_, kIndent, flags_, pugi::encoding_utf8, depth);
+                child.print(text, kIndent, flags_, pugi::encoding_utf8, depth);
+            out_.write(text.text.data(), text.text.size());
         }
     }
 
