@@ -59,8 +59,9 @@ private:
         for (;;) {
             const size_t at = pending_.find(kMarkerOpen);
             if (at == std::string::npos) break;
+            // Indented output puts the marker on a line of its own, after its depth in tabs.
             size_t lineStart = at;
-            while (lineStart > 0 && pending_[lineStart - 1] == '\t') --lineStart;
+            while (indented && lineStart > 0 && pending_[lineStart - 1] == '\t') --lineStart;
             const size_t close = pending_.find(kMarkerClose, at + kMarkerOpen.size());
             // The marker, and the line break after it, must be whole before it is replaced.
             if (close == std::string::npos || (indented && close + kMarkerClose.size() == pending_.size() && !atEnd)) {
