@@ -74,6 +74,25 @@ TEST_F(DieCuts, TwoSidedLayoutGivesTwoSidedDieSheets) {
     EXPECT_EQ(t.attr("//RunList[@Run='" + std::to_string(back) + "']", "Pages"), "1");
 }
 
+// Both objects of a one-sided sheet show page 0: each die sheet gets one row for both.
+TEST_F(DieCuts, DieSheetObjectsShowingOnePageShareOneRow) {
+    VORLAN_REQUIRE_CORPUS();
+    TicketSpec shape;
+    shape.sheets = 1;
+    shape.twoSided = false;
+    shape.extraOrd = 0;
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLayers, {}, &die));
+    TicketView t = run(job);
+    ASSERT_EQ(t.count("//Sheet"), 3u);
+    EXPECT_EQ(t.count("//InterpretingParams[@Run]"), 3u);
+    for (const char* sheet : {"2", "3"}) {
+        auto objects = t.all(std::string("//Sheet[") + sheet + "]/Surface/ContentObject");
+        ASSERT_EQ(objects.size(), 2u) << sheet;
+        EXPECT_STREQ(objects[0].node().attribute("Ord").value(), objects[1].node().attribute("Ord").value()) << sheet;
+    }
+    EXPECT_EQ(t.attr("//Sheet[1]/Surface/ContentObject[2]", "Ord"), "0");  // the content sheet is untouched
+}
+
 TEST_F(DieCuts, DisabledDieOnlySwitchesTheDieOff) {
     VORLAN_REQUIRE_CORPUS();
     die.enable = false;
