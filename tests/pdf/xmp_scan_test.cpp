@@ -107,19 +107,6 @@ TEST(XmpInks, ShapeOfTheList) {
     EXPECT_FALSE(readXMPInks(nullptr, none));
 }
 
-TEST(XmpInks, CollectsTechnicalAndDieInksFromTheFile) {
-    TempDir dir;
-    std::string path = makePdf(dir, {"Gold"}, vorlan::test::eskoXmp({{"Gold", "pantone", "normal"},
-                                                                     {"Varnish", "designer", "varnish"},
-                                                                     {"Die", "designer", "technical"}}));
-    std::vector<std::string> technical, die;
-    collectEskoTechnicalInks(path.c_str(), technical, die);
-    EXPECT_EQ(technical, (std::vector<std::string>{"Varnish", "Die"}));
-    EXPECT_EQ(die, (std::vector<std::string>{"Die"}));
-    collectEskoTechnicalInks((dir / "missing.pdf").c_str(), technical, die);
-    EXPECT_EQ(technical.size(), 2u);
-}
-
 TEST(XmpScan, EskoModeWritesTechnicalVersionAndDieCut) {
     TempDir dir;
     std::string pdf = makePdf(dir, {"Gold", "Gold", "Gold"},
@@ -180,13 +167,3 @@ TEST(XmpScan, DieLibraryModeMatchesPageInksAgainstSeparations) {
     EXPECT_FALSE(std::filesystem::exists(out));
 }
 
-TEST(XmpScan, DieLibraryModeWithoutUsableLibrary) {
-    TempDir dir;
-    std::string pdf = makePdf(dir, {"Die"}, ""), out = (dir / "die.impinfo").string();
-    for (const char* library : {"<AutoDieLibrary><Separations><Separation Name=\"Die\">",  // not well-formed
-                                "<OtherRoot><Separations><Separation Name=\"Die\"/></Separations></OtherRoot>"}) {
-        DieLibraryHome home(library);
-        EXPECT_EQ(scanPdfInksToDescription(pdf.c_str(), out.data(), true), 2);
-        EXPECT_FALSE(std::filesystem::exists(out));
-    }
-}
