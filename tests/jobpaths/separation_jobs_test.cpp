@@ -21,7 +21,9 @@ namespace {
 
 const std::vector<std::string> kInks = {"Gold", "Silver", "CutContour"};
 
-void writeSpotPdf(const fs::path& file, int pages) { vorlan::test::writeSpotPdf(file.string(), kInks, pages); }
+void writeSpotPdf(const fs::path& file, int pages) {
+    vorlan::test::writeSpotPdf(file.string(), vorlan::test::samePages(kInks, pages));
+}
 
 using Plates = std::map<std::string, long>;
 

@@ -22,22 +22,6 @@ using vorlan::test::DieLibraryHome;
 
 namespace {
 
-// Writes a PDF whose pages paint the given spot inks (one list per page) beside a black square.
-void writePdf(const fs::path& path, const std::vector<std::vector<std::string>>& pages, const std::string& xmp) {
-    vorlan::test::TestPdf pdf;
-    for (const std::vector<std::string>& spots : pages) {
-        std::string resources = "<< /ColorSpace << ", content = "0 0 0 1 k 0 0 20 20 re f ";
-        for (size_t i = 0; i < spots.size(); ++i) {
-            const std::string cs = "/CS" + std::to_string(i);
-            resources += cs + " " + pdf.separation(spots[i]) + " ";
-            content += cs + " cs 1 scn " + std::to_string(30 + 30 * i) + " 0 20 20 re f ";
-        }
-        pdf.addPage(content, resources + ">> >>");
-    }
-    if (!xmp.empty()) pdf.setXmp(xmp);
-    pdf.write(path.string());
-}
-
 std::string joined(const std::vector<wchar_t*>& names) {
     std::string text;
     for (const wchar_t* name : names) text += (text.empty() ? "" : ",") + vorlan::os::toUtf8(name);
@@ -79,7 +63,7 @@ public:
     ~ThreePdfJob() { unsetenv("VORLAN_JOB_STORE"); }
 
     void pdf(const char* name, const std::vector<std::vector<std::string>>& pages, const std::string& xmp = "") {
-        writePdf(job.dataFolder / name, pages, xmp);
+        vorlan::test::writeSpotPdf((job.dataFolder / name).string(), pages, xmp);
     }
 
     // Runs the pipeline (job 1) without a description from the host; the worker keeps what it read.
@@ -199,7 +183,8 @@ TEST(AutoDescriptionPlates, FirstVariantLeavesTheDiePlateBlank) {
         vorlan::test::TempDir dir;
         setenv("VORLAN_JOB_STORE", (dir / "store").c_str(), 1);
         Job job = writeTicketJob(dir.path(), TicketSpec{}, "");  // four content pages of content.pdf
-        writePdf(job.dataFolder / "content.pdf", std::vector<std::vector<std::string>>(4, {"Gold", "Die"}), c.xmp);
+        vorlan::test::writeSpotPdf((job.dataFolder / "content.pdf").string(), vorlan::test::samePages({"Gold", "Die"}, 4),
+                                   c.xmp);
         if (c.autoDieControl) setJobAttribute("KVAutoDieControl", c.autoDieControl);
         const int result = consume(job, "All", true);
         unsetenv("VORLAN_JOB_STORE");
