@@ -46,6 +46,8 @@ TEST_F(LayerMode, TwoVersionsOnTheirOwnSheets) {
     TicketView t = run(job);
     ASSERT_TRUE(t.loaded());
     EXPECT_EQ(t.attr("/JDF", "Types"), "Imposition Interpreting Rendering DigitalPrinting");
+    EXPECT_EQ(t.attr("/JDF", "xsi:type"), "Combined");
+    EXPECT_EQ(t.attr("/JDF", "xmlns:xsi"), "http://www.w3.org/2001/XMLSchema-instance");
     EXPECT_EQ(t.count("//Surface[@KAV_tkt:VersionName='English'][@KAV_tkt:VersionCopyCount='500'][@KAV_tkt:VersionIndex='0']"), 2u);
     EXPECT_EQ(t.count("//Surface[@KAV_tkt:VersionName='German'][@KAV_tkt:VersionCopyCount='300'][@KAV_tkt:VersionIndex='1']"), 2u);
     EXPECT_EQ(t.count("//Surface[@KAV_tkt:is_duplex='1']"), 4u);
@@ -53,6 +55,8 @@ TEST_F(LayerMode, TwoVersionsOnTheirOwnSheets) {
     // Four rows from the ticket and one new pair per versioned object, each with its switches.
     EXPECT_EQ(t.count("/JDF/ResourcePool/InterpretingParams/InterpretingParams"), 8u);
     EXPECT_EQ(t.count("/JDF/ResourcePool/RunList[@PartIDKeys='Run']/RunList"), 8u);
+    // The schema leaves these tokens open: every row takes the default from the PDF, printed.
+    EXPECT_EQ(t.count("//InterpretingParams[@Run]/PDFInterpretingParams[@OCGDefault='FromPDF'][@OCGProcess='Print']"), 8u);
     for (auto surface : t.all("//Surface")) {
         std::string version = surface.node().attribute("KAV_tkt:VersionName").value();
         int ord = surface.node().child("ContentObject").attribute("Ord").as_int();
