@@ -75,3 +75,11 @@ TEST(JdfValues, WideTextAndTokenLists) {
     ASSERT_TRUE(p.ParseString(doc.ToString()));
     EXPECT_EQ(JDFElement(p.GetRoot()).GetDescriptiveName(), s);
 }
+
+// A number outside a table is refused; Unknown is written only where allowed.
+TEST(JdfValues, TokensOutsideTheTableAreRefused) {
+    EXPECT_THROW(Tables::Token(Tables::Side, 3), JDFException);
+    EXPECT_THROW(Tables::Token(Tables::Side, -1), JDFException);
+    EXPECT_THROW(Tables::Token(Tables::SizePolicy, 0), JDFException);
+    EXPECT_EQ(Tables::Token(Tables::MediaType, 0, true), L"Unknown");
+}
