@@ -4,6 +4,7 @@
 // back a null element, so the first failure ends the write before anything is saved.
 #pragma once
 
+#include <algorithm>
 #include <functional>
 
 #include "platform/jdf/jdf.h"
@@ -29,6 +30,31 @@ Element need(Element element) {
 template <typename Resource>
 Resource runPartition(Resource& resource, int32_t ordinal) {
     return need(Resource(resource.AddPartition(20, JDF::WString::valueOf(ordinal))));
+}
+
+// How a resource's per-ordinal partitions are written: into the tree, or made batch by batch
+// while the ticket is saved (the document then never holds them all; see KElement::DeferChildren).
+// Deferred partitions are out of reach of anything that walks the tree before the save.
+enum class PartitionWriting { InTree, Deferred };
+inline constexpr int32_t kDeferredPartitionBatch = 512;
+
+// Makes the Run partitions of ordinals 0 to count - 1 with makeOne(parent, k), which appends the
+// partition of ordinal k (or none) to parent. Deferred, makeOne runs during the save, so it and
+// what it refers to must outlive the save; what it throws fails the save.
+template <typename Resource, typename MakeOne>
+void writeRunPartitions(Resource& resource, int32_t count, PartitionWriting writing, MakeOne makeOne) {
+    if (count <= 0) return;
+    if (writing == PartitionWriting::InTree) {
+        for (int32_t k = 0; k < count; ++k) makeOne(resource, k);
+        return;
+    }
+    resource.AddPartIDKey(20);  // what the first partition would have added to the resource
+    resource.DeferChildren([count, next = int32_t{0}, makeOne](JDF::KElement& scratch) mutable {
+        Resource parent(scratch);
+        for (const int32_t end = next + std::min(count - next, kDeferredPartitionBatch); next < end; ++next)
+            makeOne(parent, next);
+        return next < count;
+    });
 }
 
 // Appends the next Run partition (numbered by `next`, which moves on) for a file: a
@@ -65,11 +91,11 @@ void setSinglePage(JDF::JDFRunList& part, int32_t page);
 
 // The Layout resource rebuilt from the model; false when the model has no signature.
 bool writeLayout(LD_JDF& worker, JDF::JDFNode& root);
-// The InterpretingParams resource (one Run partition per ordinal); false when the ordinal table
-// is empty.
+// The InterpretingParams resource (one Run partition per ordinal, deferred); false when the
+// ordinal table is empty.
 bool writeInterpretingParams(LD_JDF& worker, JDF::JDFNode& root);
 // The content and marks run lists, one Run partition per ordinal.
-void writeContentRunList(LD_JDF& worker, JDF::JDFNode& root);
-void writeMarksRunList(LD_JDF& worker, JDF::JDFNode& root);
+void writeContentRunList(LD_JDF& worker, JDF::JDFNode& root, PartitionWriting writing);
+void writeMarksRunList(LD_JDF& worker, JDF::JDFNode& root, PartitionWriting writing);
 
 }  // namespace vorlan::jdf

@@ -95,8 +95,12 @@ LDError buildTicket(LD_JDF& w, JDF::JDFDoc& doc) {
 
     bool layout = writeLayout(w, root);
     bool interpreting = writeInterpretingParams(w, root);
-    if (!w.contentRuns.empty()) writeContentRunList(w, root);
-    if (!w.markRuns.empty()) writeMarksRunList(w, root);
+    // A ticket without a layout and with one die cut gets its die partitions' files copied below,
+    // which walks the run lists in the tree.
+    const bool copiesDieFiles = !layout && interpreting && w.m_XMLDieCuts.size() == 1;
+    const PartitionWriting runs = copiesDieFiles ? PartitionWriting::InTree : PartitionWriting::Deferred;
+    if (!w.contentRuns.empty()) writeContentRunList(w, root, runs);
+    if (!w.markRuns.empty()) writeMarksRunList(w, root, runs);
 
     if (root.AppendMatchingResource(L"Component", 2).isNull()) return LD_FAILED;
     if (layout && interpreting) {
@@ -105,7 +109,7 @@ LDError buildTicket(LD_JDF& w, JDF::JDFDoc& doc) {
         root.SetTypes(JDF::vWString(L"Imposition Rendering DigitalPrinting"));
     } else if (interpreting) {
         root.SetTypes(JDF::vWString(L"Interpreting Rendering DigitalPrinting"));
-        if (w.m_XMLDieCuts.size() == 1) w.duplicateRunListFiles(root);
+        if (copiesDieFiles) w.duplicateRunListFiles(root);
     }
     return LD_OK;
 }

@@ -59,26 +59,36 @@ bool writeInterpretingParams(LD_JDF& w, JDF::JDFNode& root) {
     JDF::JDFInterpretingParams resource = need(root.AppendMatchingResource(L"InterpretingParams", 1));
     resource.SetStatus(LD_RESOURCE_AVAILABLE);
     if (w.layerDataMap.empty()) return true;  // no layers: one unpartitioned resource
-    for (int32_t k = 0; k < tableSize(w); ++k) {
-        LD_OrdinalTableElement* row = rowOf(w, k);
-        const LD_OCG_InterpretingParams* params = row && row->content ? row->content->interpretingParams : nullptr;
-        JDF::JDFInterpretingParams part = runPartition(resource, k);
-        writeSwitches(need(part.GetCreatePDFInterpretingParams(k)), params);
-    }
+    writeRunPartitions(resource, tableSize(w), PartitionWriting::Deferred,
+                       [&w](JDF::JDFInterpretingParams& parent, int32_t k) {
+                           LD_OrdinalTableElement* row = rowOf(w, k);
+                           const LD_OCG_InterpretingParams* params =
+                               row && row->content ? row->content->interpretingParams : nullptr;
+                           JDF::JDFInterpretingParams part = runPartition(parent, k);
+                           writeSwitches(need(part.GetCreatePDFInterpretingParams(k)), params);
+                       });
     return true;
 }
 
-void writeContentRunList(LD_JDF& w, JDF::JDFNode& root) {
+void writeContentRunList(LD_JDF& w, JDF::JDFNode& root, PartitionWriting writing) {
     JDF::JDFRunList runList = need(root.AppendMatchingResource(L"RunList", 10));
     runList.SetStatus(LD_RESOURCE_AVAILABLE);
-    const bool dieTags = !w.jobHasTicket || w.ticket->layoutElement.isNull();
+    // A row without content makes no partition: a list that would have none is left as it is.
+    bool anyContent = false;
     for (int32_t k = 0; k < tableSize(w); ++k) {
         LD_OrdinalTableElement* row = rowOf(w, k);
         if (!row) throw WriteFailure{};
-        if (!row->content) continue;
+        anyContent = anyContent || row->content;
+    }
+    if (!anyContent) return;
+    const bool dieTags = !w.jobHasTicket || w.ticket->layoutElement.isNull();
+    writeRunPartitions(runList, tableSize(w), writing, [&w, dieTags](JDF::JDFRunList& parent, int32_t k) {
+        LD_OrdinalTableElement* row = rowOf(w, k);
+        if (!row) throw WriteFailure{};
+        if (!row->content) return;
         LD_Run* run = row->content->run;
         if (!run) throw WriteFailure{};
-        JDF::JDFRunList part = runPartition(runList, k);
+        JDF::JDFRunList part = runPartition(parent, k);
         bool backSide = false;
         if (row->content->page != -1) {
             setSinglePage(part, row->content->page);
@@ -90,13 +100,13 @@ void writeContentRunList(LD_JDF& w, JDF::JDFNode& root) {
         element.SetIsTrapped(false);
         if (run->IsBlank) element.SetIsBlank(true);
         else if (run->pdf) writeFileSpec(w, element, run->pdf);
-    }
+    });
 }
 
-void writeMarksRunList(LD_JDF& w, JDF::JDFNode& root) {
+void writeMarksRunList(LD_JDF& w, JDF::JDFNode& root, PartitionWriting writing) {
     JDF::JDFRunList runList = need(root.AppendMatchingResource(L"RunList", 9));
     runList.SetStatus(LD_RESOURCE_AVAILABLE);
-    for (int32_t k = 0; k < tableSize(w); ++k) {
+    writeRunPartitions(runList, tableSize(w), writing, [&w](JDF::JDFRunList& parent, int32_t k) {
         LD_OrdinalTableElement* row = rowOf(w, k);
         if (!row) throw WriteFailure{};
         LD_MarkTableElement* mark = row->mark;
@@ -105,12 +115,12 @@ void writeMarksRunList(LD_JDF& w, JDF::JDFNode& root) {
             mark = first ? first->mark : nullptr;
         }
         if (!mark || !mark->run) throw WriteFailure{};
-        JDF::JDFRunList part = runPartition(runList, k);
+        JDF::JDFRunList part = runPartition(parent, k);
         setSinglePage(part, mark->page);
         JDF::JDFLayoutElement element = need(part.GetCreateLayoutElement());
         element.SetIsTrapped(false);
         if (mark->run->pdf) writeFileSpec(w, element, mark->run->pdf);
-    }
+    });
 }
 
 }  // namespace vorlan::jdf

@@ -44,32 +44,31 @@ void writePasses(LD_JDF& w, JDF::JDFNode& root, bool marks, int passes) {
     JDF::JDFRunList runList = need(root.AppendMatchingResource(L"RunList", marks ? 9 : 10));
     runList.SetStatus(LD_RESOURCE_AVAILABLE);
     const int32_t n = static_cast<int32_t>(w.m_OrdinalTable.size());
-    LD_OrdinalTableElement* first = rowOf(w, 0);
-    for (int pass = 0; pass < passes; ++pass) {
-        for (int32_t k = 0; k < n; ++k) {
-            LD_OrdinalTableElement* row = rowOf(w, k);
-            if (!row) throw WriteFailure{};
-            LD_Run* run = nullptr;
-            int32_t page = -1;
-            if (marks) {
-                LD_MarkTableElement* mark = row->mark ? row->mark : first ? first->mark : nullptr;
-                if (mark) {
-                    run = mark->run;
-                    page = mark->page;
-                }
-            } else {
-                LD_ContentTableElement* content = row->content ? row->content : first ? first->content : nullptr;
-                if (content) {
-                    run = content->run;
-                    page = content->page;
-                }
+    writeRunPartitions(runList, passes * n, PartitionWriting::Deferred, [&w, marks, n](JDF::JDFRunList& parent, int32_t i) {
+        const int pass = i / n;
+        LD_OrdinalTableElement* row = rowOf(w, i % n);
+        if (!row) throw WriteFailure{};
+        LD_OrdinalTableElement* first = rowOf(w, 0);
+        LD_Run* run = nullptr;
+        int32_t page = -1;
+        if (marks) {
+            LD_MarkTableElement* mark = row->mark ? row->mark : first ? first->mark : nullptr;
+            if (mark) {
+                run = mark->run;
+                page = mark->page;
             }
-            if (!run) throw WriteFailure{};
-            JDF::JDFRunList part = runPartition(runList, pass * n + k);
-            if (page != -1) setSinglePage(part, page);
-            writeFile(w, part, run, pass);
+        } else {
+            LD_ContentTableElement* content = row->content ? row->content : first ? first->content : nullptr;
+            if (content) {
+                run = content->run;
+                page = content->page;
+            }
         }
-    }
+        if (!run) throw WriteFailure{};
+        JDF::JDFRunList part = runPartition(parent, i);
+        if (page != -1) setSinglePage(part, page);
+        writeFile(w, part, run, pass);
+    });
 }
 
 }  // namespace

@@ -1,6 +1,7 @@
 // Building documents: the edges the ticket writers rely on (IDs, bounded resource slots, links
 // and copies across documents, references, deletion while walking) and atomic writing. What the
 // writers build is validated against the schema through the jobs that write it.
+#include <cstdlib>
 #include <filesystem>
 
 #include <gtest/gtest.h>
@@ -10,6 +11,16 @@
 
 namespace fs = std::filesystem;
 using namespace JDF;
+
+namespace {
+
+// Fixes the creation timestamp, so documents built twice write the same bytes.
+struct FixedTime {
+    FixedTime() { setenv("SOURCE_DATE_EPOCH", "1700000000", 1); }
+    ~FixedTime() { unsetenv("SOURCE_DATE_EPOCH"); }
+};
+
+}  // namespace
 
 TEST(JdfCreate, ResourceSlotsIdsAndLinks) {
     EXPECT_THROW(JDFDoc(1), JDFException);
@@ -118,4 +129,55 @@ TEST(JdfCreate, ReferencesFollowIdChangesCopiesAndDeletions) {
     EXPECT_TRUE(root.GetMatchingResource(L"Media", 3).isNull());
     EXPECT_FALSE(root.IsValid(5));
     EXPECT_TRUE(root.IsValid(0));
+}
+
+// Children deferred to the save are written byte for byte as the same children held in the tree:
+// indented and (past 100 levels) raw, in batches that cross the serialiser's buffer, with
+// namespaced attributes whose prefix the root declares. A maker that throws fails the write and
+// leaves the target as it was.
+TEST(JdfWrite, DeferredChildrenAreWrittenAsIfHeldInTheTree) {
+    FixedTime fixed;
+    auto addPartition = [](KElement& parent, int k) {
+        JDFResource part = JDFResource(parent).AddPartition(20, WString::valueOf(k));
+        part.SetAttribute(L"KAV_tkt:VersionName", L"Version <" + WString::valueOf(k % 3) + L">",
+                          L"http://www.vorlan.org/JDF/ticket/1.0");
+        part.AppendElement(L"LayoutElement").SetAttribute(L"IsTrapped", L"false");
+    };
+    auto build = [&](int partitions, int nesting, bool deferred) {
+        JDFDoc doc(0);
+        JDFNode root = doc.GetJDFRoot();
+        root.SetAttribute(L"xmlns:KAV_tkt", L"http://www.vorlan.org/JDF/ticket/1.0");
+        KElement parent = root.GetResourcePool();
+        for (int i = 0; i < nesting; ++i) parent = parent.AppendElement(L"Nest");
+        JDFResource list = root.AppendMatchingResource(L"RunList", 10);
+        if (nesting > 0) list = JDFResource(parent.CopyElement(list));
+        list.AddPartIDKey(20);
+        if (!deferred) {
+            for (int k = 0; k < partitions; ++k) addPartition(list, k);
+        } else {
+            list.DeferChildren([=, next = 0](KElement& scratch) mutable {
+                for (int end = std::min(partitions, next + 100); next < end; ++next) addPartition(scratch, next);
+                return next < partitions;
+            });
+        }
+        root.AppendMatchingResource(L"Component", 2);
+        return doc;
+    };
+    for (auto [partitions, nesting] : {std::pair{1, 0}, {250, 0}, {3000, 0}, {40, 101}}) {
+        SCOPED_TRACE(testing::Message() << partitions << " partitions at nesting " << nesting);
+        const std::string expected = build(partitions, nesting, false).ToString();
+        EXPECT_EQ(build(partitions, nesting, true).ToString(), expected);
+        vorlan::test::TempDir tmp;
+        ASSERT_TRUE(build(partitions, nesting, true).Write2File(WString((tmp / "out.jdf").string())));
+        EXPECT_EQ(vorlan::test::readFile(tmp / "out.jdf"), expected);
+    }
+
+    vorlan::test::TempDir tmp;
+    vorlan::test::writeFile(tmp / "out.jdf", "old contents");
+    JDFDoc failing(0);
+    failing.GetJDFRoot().GetResourcePool().AppendElement(L"RunList").DeferChildren(
+        [](KElement&) -> bool { throw JDFException("no more"); });
+    EXPECT_FALSE(failing.Write2File(WString((tmp / "out.jdf").string())));
+    EXPECT_EQ(vorlan::test::readFile(tmp / "out.jdf"), "old contents");
+    EXPECT_EQ(std::distance(fs::directory_iterator(tmp.path()), fs::directory_iterator()), 1);
 }

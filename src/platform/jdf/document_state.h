@@ -3,17 +3,31 @@
 // that read it may be gone).
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <string>
 #include <unordered_map>
+#include <vector>
 
 #include <pugixml.hpp>
 
 namespace JDF::detail {
 
+struct DocumentState;
+
+// Children of `parent` that are made only while the document is written, batch by batch (see
+// KElement::DeferChildren). makeBatch appends the next batch to scratchParent, an element of its
+// own scratch document, and returns false once it has appended the last.
+struct DeferredChildren {
+    pugi::xml_node parent;
+    std::function<bool(pugi::xml_node scratchParent, const std::shared_ptr<DocumentState>& scratch)> makeBatch;
+};
+
 struct DocumentState {
     pugi::xml_document doc;
     unsigned long nextId = 1;
+    // Placeholders in the tree, by the number their marker comment carries.
+    std::vector<DeferredChildren> deferred;
 
     // A new ID: prefix followed by a six-digit counter, skipping IDs already in the document.
     std::string NewID(const char* prefix);

@@ -15,12 +15,12 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include "platform/jdf/deferred_output.h"
 #include "platform/jdf/exception.h"
 
 namespace JDF {
 namespace {
 
-const char* const kIndent = "\t";
 // Indentation grows with depth, so output of a deeply nested tree would grow with the square of
 // its depth: beyond this depth documents are written without indentation.
 constexpr int kMaxIndentedDepth = 100;
@@ -103,7 +103,8 @@ KElement XMLDoc::GetRoot() const {
 std::string XMLDoc::ToString() const {
     if (!doc_) return {};
     std::ostringstream out;
-    doc_->doc.save(out, kIndent, formatFor(doc_->doc), pugi::encoding_utf8);
+    pugi::xml_writer_stream writer(out);
+    detail::saveDocument(*doc_, writer, formatFor(doc_->doc));
     return out.str();
 }
 
@@ -111,7 +112,7 @@ bool XMLDoc::Write2File(const WString& fileName) const {
     if (!doc_ || fileName.empty()) return false;
     return vorlan::os::replaceFileAtomically(fileName.getUTF8(), [this](int fd) {
         FdWriter writer(fd);
-        doc_->doc.save(writer, kIndent, formatFor(doc_->doc), pugi::encoding_utf8);
+        detail::saveDocument(*doc_, writer, formatFor(doc_->doc));
         return writer.ok();
     });
 }

@@ -6,6 +6,8 @@
 #include <set>
 #include <string>
 
+#include "platform/jdf/deferred_output.h"
+#include "platform/jdf/exception.h"
 #include "platform/jdf/node_walk.h"
 #include "platform/os/text.h"
 
@@ -370,6 +372,17 @@ void KElement::DeleteNode() {
     if (doc_) doc_->IDsChanged();
     if (parent) parent.remove_child(node_);
     node_ = pugi::xml_node();
+}
+
+void KElement::DeferChildren(std::function<bool(KElement& scratchParent)> makeBatch) {
+    if (!node_ || !doc_ || !makeBatch) throw JDFException("DeferChildren: null element or maker");
+    const size_t index = doc_->deferred.size();
+    if (!node_.append_child(pugi::node_comment).set_value(detail::deferredMarkerText(index).c_str()))
+        throw JDFException("DeferChildren: out of memory");
+    doc_->deferred.push_back({node_, [make = std::move(makeBatch)](pugi::xml_node parent, const detail::DocumentPtr& scratch) {
+                                  KElement element(parent, scratch);
+                                  return make(element);
+                              }});
 }
 
 WString KElement::GetText() const { return node_ ? WString(node_.text().get()) : WString(); }

@@ -14,6 +14,7 @@
 //    entries equal the element's attributes; an empty filter matches every element.
 #pragma once
 
+#include <functional>
 #include <vector>
 
 #include "platform/jdf/attribute_map.h"
@@ -111,6 +112,14 @@ public:
     KElement GetDocRoot() const;
     // Removes this element (and its subtree) from the tree; the handle becomes null.
     void DeleteNode();
+    // Children made only when the document is written, so that the tree never holds them all:
+    // `makeBatch` gets an empty element with this element's name and attributes (in a scratch
+    // document with the namespace declarations in scope here), appends the next batch of children
+    // to it and returns false once it has appended the last. Each batch is written where this
+    // element's children go, after those it has now, and dropped. Until the document is written
+    // the tree holds a marker comment instead; makeBatch (and what it refers to) must stay valid
+    // until then. Whatever makeBatch throws makes the write fail.
+    void DeferChildren(std::function<bool(KElement& scratchParent)> makeBatch);
     // Text content of the element (first text child).
     WString GetText() const;
     void SetText(const WString& text);
