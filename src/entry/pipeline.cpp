@@ -204,7 +204,9 @@ LDError LD_JDF::JDF_InitializeAndCreateNewJDF(char* outputPath, char* xmlBuffer,
     }
     if (LDError died = addDieCut(jobHasTicket); died != LD_OK) return exitWith(died);
 
-    // 16. The new ticket.
+    // 16. The new ticket, built from the model alone: the parsed input ticket goes first, so
+    // the two documents are never held at once.
+    if (ticket) ticket->dropTree();
     if (LDError written = writeJDF(outputJdfPath); written != LD_OK) return exitWith(written);
 
     // 17. Release the model.

@@ -48,7 +48,7 @@ LDError LD_JDF::addDieCut(bool hasTicket) {
     LD_DieCut* die = m_XMLDieCuts[0];
 
     // 4. A layout: a die-with-content sheet, then a die-only sheet, after the last sheet.
-    if (hasTicket && !ticket->layoutElement.isNull()) {
+    if (hasTicket && ticket->hasLayout()) {
         if (versions.empty() && surfaces.empty()) return LD_OK;
         for (ContentType type : {CONTENT_DIE_WITH_CONTENT, CONTENT_DIE_ONLY}) {
             LD_Sheet* sheet = appendDieSheetInLayout(0, type);

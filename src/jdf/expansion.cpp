@@ -128,7 +128,7 @@ LDError LayoutExpansion::expandContentObject(const XMLContentObjectData& entry) 
 }  // namespace
 
 LDError LD_JDF::createRunListAndInterpretingParamPairs(bool hasTicket) {
-    const bool layout = !ticket->layoutElement.isNull();
+    const bool layout = ticket->hasLayout();
 
     if (versions.empty() && !hasTicket) {  // Path A: one pair per selected page of the bare PDF
         XMLLayerData* defaults = layerDataMap.empty() ? nullptr : layerDataMap.begin()->second;
@@ -219,7 +219,7 @@ LDError LD_JDF::markCurrLayoutOrRunlistAsDefaultVersion(bool mark) {
         index = 0;
         copies = 0;
     };
-    if (!ticket->layoutElement.isNull()) {
+    if (ticket->hasLayout()) {
         for (LD_Surface* surface : surfaces)
             if (surface) tag(surface->VersionName, surface->VersionIndex, surface->VersionCopyCount);
     } else {

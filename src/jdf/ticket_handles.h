@@ -19,6 +19,10 @@ struct LD_JDFHandles {
     JDF::KElement runListElement;
     // Whether the ticket as read had a Layout of its own; one the reader injected does not count.
     bool ticketHasLayout = false;
+    // Whether there is a layout to read: the ticket's own or an injected one. Unlike
+    // layoutElement, it still answers once the tree is dropped.
+    bool hasLayout() const { return !layoutElement.isNull() || droppedLayout; }
+    bool droppedLayout = false;  // layoutElement was set when the tree was dropped
 
     // Look-up indexes over the model's lists; rebuilt on demand, so copies may share nothing.
     vorlan::jdf::ModelIndexes indexes;
@@ -40,6 +44,18 @@ struct LD_JDFHandles {
           interpretingParamsElement(other.interpretingParamsElement),
           renderingParamsElement(other.renderingParamsElement),
           digitalPrintingParamsElement(other.digitalPrintingParamsElement),
-          runListElement(other.runListElement), ticketHasLayout(other.ticketHasLayout),
+          runListElement(other.runListElement), ticketHasLayout(other.ticketHasLayout), droppedLayout(other.droppedLayout),
           displacedSurfaces(other.displacedSurfaces) {}
+
+    // Lets go of the parsed ticket (the document lives while any handle does), once nothing
+    // will read it again: the node queries then find nothing.
+    void dropTree() {
+        droppedLayout = hasLayout();
+        parser.reset();
+        rootNode = JDF::JDFNode();
+        processNode = JDF::JDFNode();
+        layoutElement = interpretingParamsElement = renderingParamsElement = JDF::KElement();
+        digitalPrintingParamsElement = runListElement = JDF::KElement();
+        std::vector<JDF::KElement>().swap(surfaceElements);
+    }
 };

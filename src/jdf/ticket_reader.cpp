@@ -242,7 +242,7 @@ LDError LD_JDF::JDF_InitializeAndParseJDF(wchar_t* path) {
     t.processNode = JDF::JDFNode();
     t.layoutElement = t.interpretingParamsElement = t.renderingParamsElement = JDF::KElement();
     t.digitalPrintingParamsElement = t.runListElement = JDF::KElement();
-    t.ticketHasLayout = false;
+    t.ticketHasLayout = t.droppedLayout = false;
 
     try {
         t.parser = std::make_unique<JDF::JDFParser>();

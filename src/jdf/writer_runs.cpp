@@ -81,7 +81,7 @@ void writeContentRunList(LD_JDF& w, JDF::JDFNode& root, PartitionWriting writing
         anyContent = anyContent || row->content;
     }
     if (!anyContent) return;
-    const bool dieTags = !w.jobHasTicket || w.ticket->layoutElement.isNull();
+    const bool dieTags = !w.jobHasTicket || !w.ticket->hasLayout();
     writeRunPartitions(runList, tableSize(w), writing, [&w, dieTags](JDF::JDFRunList& parent, int32_t k) {
         LD_OrdinalTableElement* row = rowOf(w, k);
         if (!row) throw WriteFailure{};
