@@ -44,7 +44,7 @@ std::vector<MixedJob> mixedJobs(int pages) {
                                                  descriptionXml(kLayers, {version("English", surfaces, "English", "German", "", "Varnish"),
                                                                           version("German", surfaces, "German", "English", "")},
                                                                 &die));
-                        vorlan::test::writeSpotPdf((job.dataFolder / "content.pdf").string(), kInks, surfaces);
+                        vorlan::test::writeSpotPdf((job.dataFolder / "content.pdf").string(), vorlan::test::samePages(kInks, surfaces));
                     },
                     [=](const fs::path& root) {
                         return consume(Job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo",
@@ -57,7 +57,7 @@ std::vector<MixedJob> mixedJobs(int pages) {
                         Job job = writeTicketJob(root, ticketOf(pages),
                                                  descriptionXml(kSeparations, {version("Gold", surfaces, "", "", "Gold")},
                                                                 &die, true, false));
-                        vorlan::test::writeSpotPdf((job.dataFolder / "content.pdf").string(), kInks, surfaces);
+                        vorlan::test::writeSpotPdf((job.dataFolder / "content.pdf").string(), vorlan::test::samePages(kInks, surfaces));
                     },
                     [=](const fs::path& root) {
                         return consume(Job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo",
@@ -69,7 +69,7 @@ std::vector<MixedJob> mixedJobs(int pages) {
                         const DieSpec die{true, "", "CutContour"};
                         Job job = writeBarePdfJob(root, descriptionXml(kSeparations, {version("", surfaces, "", "", "Gold")},
                                                                        &die, false, false));
-                        vorlan::test::writeSpotPdf(job.dataFile.string(), kInks, surfaces);
+                        vorlan::test::writeSpotPdf(job.dataFile.string(), vorlan::test::samePages(kInks, surfaces));
                     },
                     [=](const fs::path& root) {
                         return consume(Job{root, root / "job1.pdf", root, root / "job1.impinfo", root / "out.jdf"});

@@ -1,4 +1,5 @@
-// Finding the ticket and the PDFs a ticket names inside the job's data folder.
+// Finding the ticket and the PDFs a ticket names inside the job's data folder (a %20 name in a
+// sub-folder is found end to end in pipeline_test.cpp).
 #include <cstdlib>
 #include <filesystem>
 
@@ -35,16 +36,6 @@ std::string byExtension(const fs::path& folder, const wchar_t* extension) {
 }
 
 }  // namespace
-
-TEST(FolderSearch, PercentTwentyNameFindsFileWithBlanksInSubFolder) {
-    TempDir dir;
-    writeFile(dir / "pdfs" / "Page 1.pdf", "x");
-    LD_JDF worker;
-    wchar_t name[] = L"Page%201.pdf";
-    worker.removePercentTwenty(name);
-    EXPECT_EQ(std::wstring(name), L"Page 1.pdf");
-    EXPECT_EQ(byName(dir.path(), name), (dir / "pdfs" / "Page 1.pdf").string());
-}
 
 TEST(FolderSearch, EarlierSubFolderWinsOverLaterFileAndCaseIsIgnored) {
     TempDir dir;

@@ -1,17 +1,11 @@
-// Defaults, deep copies and release of the job model.
+// Texts, page lists and deep copies of the job model. Copies of whole workers are checked in
+// tests/jdf/layout_test.cpp.
 #include <gtest/gtest.h>
 
+#include "model/geometry_strings.h"
 #include "vorlan/JDFinterface.h"
 
 namespace {
-
-// Operands of a rectangle, enough to exercise the clip-path copy.
-class RectOperands : public LD_ClipPathOperands {
-public:
-    explicit RectOperands(double w) : width(w) {}
-    LD_ClipPathOperands* clone() const override { return new RectOperands(width); }
-    double width;
-};
 
 LD_Surface* surfaceWithEverything() {
     auto* surface = new LD_Surface;
@@ -29,8 +23,11 @@ LD_Surface* surfaceWithEverything() {
     object->TrimCTM = new LD_CTM;
     object->ClipPath = new std::vector<LD_ClipPathOperations*>;
     auto* op = new LD_ClipPathOperations;
-    op->operation = CLIP_RECTANGLE;
-    op->operands = new RectOperands(5);
+    op->operation = CLIP_CURVETO;
+    auto* operands = new LD_ClipPathOperandsThreePoints;
+    operands->point1.x = 3;
+    operands->point3.text = LD_CopyText(L"3 4");
+    op->operands = operands;
     object->ClipPath->push_back(op);
     object->clipPathText = LD_CopyText(L"0 0 5 5 re");
     surface->contentObjects.push_back(object);
@@ -87,29 +84,17 @@ TEST(Records, SurfaceCopySharesNoPointer) {
     EXPECT_NE(a->ClipBox, b->ClipBox);
     EXPECT_NE(a->ClipBox->text, b->ClipBox->text);
     EXPECT_NE(a->ClipPath, b->ClipPath);
-    EXPECT_NE((*a->ClipPath)[0]->operands, (*b->ClipPath)[0]->operands);
+    auto& copiedOperands = dynamic_cast<LD_ClipPathOperandsThreePoints&>(*(*b->ClipPath)[0]->operands);
+    auto& sourceOperands = dynamic_cast<LD_ClipPathOperandsThreePoints&>(*(*a->ClipPath)[0]->operands);
+    EXPECT_NE(&copiedOperands, &sourceOperands);
+    EXPECT_EQ(copiedOperands.point1.x, 3);
+    EXPECT_NE(copiedOperands.point3.text, sourceOperands.point3.text);
     EXPECT_NE(a->clipPathText, b->clipPathText);
     EXPECT_NE(source->markObjects[0]->ClipBox, copy->markObjects[0]->ClipBox);
     b->CTM->e = 99;
     EXPECT_EQ(a->CTM->e, 10);
     delete source;
     EXPECT_STREQ(copy->VersionName, L"English");  // still intact after the source is gone
+    EXPECT_STREQ(copiedOperands.point3.text, L"3 4");
     delete copy;
-}
-
-TEST(Records, WorkerCopiesShareRecordsAndReleaseThemOnce) {
-    auto* original = new LD_JDF;
-    auto* signature = new LD_Signature;
-    auto* sheet = new LD_Sheet;
-    sheet->front = surfaceWithEverything();
-    signature->sheetList.push_back(sheet);
-    original->signatures.push_back(signature);
-    original->contentPDFs.push_back(new LD_PDF);
-    LD_JDF copy(*original);
-    EXPECT_EQ(copy.signatures[0], signature);  // shared, not duplicated
-    delete original;                            // the copy still holds them
-    EXPECT_EQ(copy.signatures[0]->sheetList[0]->front->index, 3);
-    LD_JDF moved(std::move(copy));
-    EXPECT_TRUE(copy.signatures.empty());
-    // moved's destructor frees everything; ASan reports any leak or double free
 }

@@ -1,5 +1,5 @@
 // Reading a parsed ticket: child look-ups, namespaces, inherited partition attributes, refs,
-// node search by type and activation, resources matched by process usage, enumeration defaults.
+// node search by type and activation, resources matched by process usage, links across pools.
 #include <gtest/gtest.h>
 
 #include "platform/jdf/jdf.h"
@@ -63,35 +63,20 @@ std::vector<std::wstring> ids(const vElement& v) {
 TEST(JdfNavigation, ChildLookUpsByNameNamespaceFilterAndDepth) {
     JDFNode root = parseTicket();
     ASSERT_FALSE(root.isNull());
-    // Deep search in document order, index counts matches.
-    EXPECT_EQ(root.GetChildByTagName(L"RunList", L"", 0, JDFAttributeMap(), false, true).GetAttribute(L"ID"), L"rl");
+    // Deep search in document order, index counts matches; direct children only without depth.
     EXPECT_EQ(root.GetChildByTagName(L"RunList", L"", 1, JDFAttributeMap(), false, true).GetAttribute(L"Run"), L"0");
     EXPECT_TRUE(root.GetChildByTagName(L"RunList", L"", 0, JDFAttributeMap(), true).isNull());
     EXPECT_EQ(root.GetChildByTagName(L"JDF", L"", 0, JDFAttributeMap(L"Type", L"Imposition"), false, true).GetAttribute(L"ID"), L"a");
-    EXPECT_EQ(root.GetChildByTagName(L"JDF", L"", 0, JDFAttributeMap(L"Type", L"Interpreting"), false, true).GetAttribute(L"ID"), L"c2");
-    EXPECT_TRUE(root.GetChildByTagName(L"Nope", L"*", 0, JDFAttributeMap(), false, true).isNull());
     // Namespaces: "*" and "" match any; a URI must match the element's.
-    EXPECT_FALSE(root.GetChildByTagName(L"Layout", L"*", 0, JDFAttributeMap(), false, true).isNull());
     EXPECT_FALSE(root.GetChildByTagName(L"Extra", L"http://www.esko-graphics.com/EGJDF/1.0", 0, JDFAttributeMap(), false).isNull());
     EXPECT_TRUE(root.GetChildByTagName(L"Extra", L"http://www.CIP4.org/JDFSchema_1_1", 0, JDFAttributeMap(), false).isNull());
     EXPECT_FALSE(root.GetChildByTagName(L"eg:Extra", L"", 0, JDFAttributeMap(), false).isNull());
-    // All direct children in order, with names and namespaces.
-    KElement sheet = root.GetChildByTagName(L"Sheet", L"", 0, JDFAttributeMap(), false);
-    vElement kids = sheet.GetChildrenByTagName(L"*", L"*");
-    ASSERT_EQ(kids.size(), 3u);
-    EXPECT_EQ(kids[0].GetNodeName(), L"MediaRef");
-    EXPECT_EQ(kids[1].GetNodeName(), L"eg:Extra");
-    EXPECT_EQ(kids[1].GetLocalName(), L"Extra");
-    EXPECT_EQ(kids[1].GetNamespaceURI(), L"http://www.esko-graphics.com/EGJDF/1.0");
-    EXPECT_EQ(kids[2].GetNamespaceURI(), L"http://www.CIP4.org/JDFSchema_1_1");
     // GetChildElementVector follows refs: MediaRef becomes the Media it names.
+    KElement sheet = root.GetChildByTagName(L"Sheet", L"", 0, JDFAttributeMap(), false);
     vElement resolved = JDFElement(sheet).GetChildElementVector(L"*", L"*");
     ASSERT_EQ(resolved.size(), 3u);
-    EXPECT_EQ(resolved[0].GetNodeName(), L"Media");
     EXPECT_EQ(resolved[0].GetAttribute(L"ID"), L"m2");
-    EXPECT_EQ(sheet.NumChildElements(), 3);
-    EXPECT_TRUE(sheet.HasChildElement(L"Surface"));
-    EXPECT_FALSE(sheet.HasChildElement(L"Media"));
+    EXPECT_EQ(resolved[1].GetNamespaceURI(), L"http://www.esko-graphics.com/EGJDF/1.0");
 }
 
 TEST(JdfNavigation, AttributesWithPrefixesNamespacesAndPartitionInheritance) {
@@ -100,32 +85,13 @@ TEST(JdfNavigation, AttributesWithPrefixesNamespacesAndPartitionInheritance) {
     EXPECT_EQ(rl.GetAttribute(L"eg:Flag"), L"x");
     EXPECT_EQ(rl.GetAttribute(L"Flag", L"http://www.esko-graphics.com/EGJDF/1.0"), L"x");
     EXPECT_EQ(rl.GetAttribute(L"Flag"), L"");
-    EXPECT_EQ(rl.GetAttribute(L"Missing", L"", L"dflt"), L"dflt");
-    EXPECT_TRUE(rl.IsResource(true));
-    EXPECT_TRUE(rl.IsResourceRoot());
-    vElement parts = rl.GetChildrenByTagName(L"RunList");
-    ASSERT_EQ(parts.size(), 2u);
-    JDFRunList p0 = parts[0], p1 = parts[1];
+    // Partitions inherit from the root (what every job's run lists rely on, checked end to end);
+    // a plain KElement does not.
+    JDFRunList p0 = rl.GetChildrenByTagName(L"RunList").at(0);
     EXPECT_TRUE(p0.IsResource(true));
     EXPECT_FALSE(p0.IsResource(false));
-    // Inherited from the root: Status, NPage, the LayoutElement; own: Run, Pages.
-    EXPECT_EQ(p0.GetStatus(), 7);
     EXPECT_EQ(p0.GetNPage(), 4);
-    EXPECT_EQ(p0.GetRun(), L"0");
-    EXPECT_EQ(p0.GetFileURL(), L"file:///shared.pdf");
-    EXPECT_FALSE(p0.GetLayoutElement().IsBlank());
-    EXPECT_EQ(p0.GetFirstPage(), 2);
-    EXPECT_EQ(p0.GetSkipPage(), 1);
-    EXPECT_TRUE(p0.GetEndOfDocument());
     EXPECT_EQ(p0.GetPages().ToVInt(1000).size(), 1000u);
-    EXPECT_EQ(p0.GetPartMap(), JDFAttributeMap(L"Run", L"0"));
-    // The partition's own values win.
-    EXPECT_EQ(p1.GetStatus(), 3);
-    EXPECT_EQ(p1.GetNPage(), 2);
-    EXPECT_TRUE(p1.GetLayoutElement().IsBlank());
-    EXPECT_FALSE(p1.GetEndOfDocument());
-    EXPECT_TRUE(p1.GetPages().empty());
-    // A plain KElement does not inherit.
     EXPECT_EQ(KElement(p0).GetAttribute(L"Status"), L"");
     // JDFElement::GetStatus reads the node-status table: resource tokens read 0.
     EXPECT_EQ(JDFElement(p0).GetStatus(), 0);
@@ -149,10 +115,7 @@ TEST(JdfNavigation, NodesByTypeAndActivation) {
     EXPECT_EQ(a1.GetActivation(false), 6);
     EXPECT_EQ(a1.GetActivation(true), 1);
     EXPECT_EQ(root.GetTypes(), (vWString{L"Imposition", L"Interpreting", L"Rendering"}));
-    EXPECT_TRUE(root.GetTypes().contains(L"Imposition"));
     EXPECT_FALSE(root.GetTypes().contains(L"imposition"));
-    EXPECT_EQ(root.GetICSVersions().size(), 2u);
-    EXPECT_TRUE(root.IsValid(5));
 }
 
 TEST(JdfNavigation, ResourcesAndLinksByProcessUsage) {
@@ -160,12 +123,9 @@ TEST(JdfNavigation, ResourcesAndLinksByProcessUsage) {
     EXPECT_EQ(root.GetMatchingResource(L"RunList", 10).GetID(), L"rl");
     EXPECT_EQ(root.GetMatchingResource(L"RunList", 9).GetID(), L"marks");
     EXPECT_EQ(root.GetMatchingResource(L"RunList", 3, JDFAttributeMap(), 1).GetID(), L"marks");
-    EXPECT_EQ(root.GetMatchingResource(L"RunList", 1).GetID(), L"rl");
     EXPECT_TRUE(root.GetMatchingResource(L"RunList", 2).isNull());
     EXPECT_EQ(root.GetMatchingResource(L"Layout", 3).GetID(), L"lay");
     EXPECT_EQ(root.GetMatchingResource(L"RunList", 3, JDFAttributeMap(L"Run", L"1")).GetAttribute(L"Run"), L"1");
-    EXPECT_EQ(root.GetMatchingLink(L"RunList", 9).GetProcessUsage(), L"Marks");
-    EXPECT_TRUE(root.GetMatchingResource(L"Component", 3).isNull());
     // A node whose types have no Document run list does not answer Document queries.
     JDFNode c2 = root.GetChildByTagName(L"JDF", L"", 0, JDFAttributeMap(L"ID", L"c2"), false);
     EXPECT_TRUE(c2.GetMatchingResource(L"RunList", 10).isNull());
@@ -175,30 +135,11 @@ TEST(JdfNavigation, ResourcesAndLinksByProcessUsage) {
     vElement links = rl.GetLinks(L"*");
     ASSERT_EQ(links.size(), 2u);
     for (const KElement& l : links) EXPECT_EQ(JDFResourceLink(l).GetProcessUsage(), L"Document");
-    EXPECT_EQ(root.GetResourcePool().GetPoolChildren(L"*", JDFAttributeMap(), L"*").size(), 7u);
     EXPECT_EQ(ids(root.GetResourcePool().GetPoolChildren(L"Media")), (std::vector<std::wstring>{L"m1", L"m2", L"m3"}));
-    EXPECT_EQ(root.GetLink(rl).GetUsage(), 1);
-}
-
-TEST(JdfNavigation, MediaGettersAndEnumerationDefaults) {
-    JDFNode root = parseTicket();
-    JDFResourcePool pool = root.GetResourcePool();
-    JDFMedia m1 = pool.GetResource(L"Media", 0), m2 = pool.GetResource(L"Media", 1), m3 = pool.GetResource(L"Media", 2);
-    EXPECT_EQ(m1.GetMediaType(), 12);
-    EXPECT_DOUBLE_EQ(m1.GetDimension().GetX(), 595.3);
-    EXPECT_DOUBLE_EQ(m1.GetDimension().GetY(), 841.9);
-    EXPECT_DOUBLE_EQ(m1.GetThickness(), 100.5);
-    EXPECT_DOUBLE_EQ(m1.GetWeight(), 80);
-    EXPECT_EQ(m1.GetDescriptiveName(), L"A4 80g");
-    EXPECT_EQ(m1.GetMediaUnit(), 3);       // missing → Sheet
-    EXPECT_EQ(m1.GetGrainDirection(), 0);  // missing → Unknown
-    EXPECT_EQ(m2.GetMediaUnit(), 2);
-    EXPECT_EQ(m2.GetGrainDirection(), 2);
-    EXPECT_EQ(m2.GetMediaType(), 0);
-    EXPECT_DOUBLE_EQ(m2.GetDimension().GetX(), 0);
-    EXPECT_EQ(m3.GetMediaUnit(), 0);  // unknown token
-    EXPECT_EQ(m3.GetMediaType(), 0);  // tokens are case-sensitive
-    EXPECT_EQ(JDFResource(m1).GetStatus(), 7);
+    // Enumeration tokens are case-sensitive; an unknown one reads 0.
+    JDFMedia m3 = root.GetResourcePool().GetResource(L"Media", 2);
+    EXPECT_EQ(m3.GetMediaUnit(), 0);
+    EXPECT_EQ(m3.GetMediaType(), 0);
 }
 
 // A node's links resolve in its own pool and its ancestors' pools, the nearest first; a sibling

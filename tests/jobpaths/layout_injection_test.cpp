@@ -13,30 +13,23 @@
 
 namespace fs = std::filesystem;
 using namespace layermode_test;
+using vorlan::test::runPartition;
 
 namespace {
 
 const char* const kMedia = R"(<Media ID="M" Class="Consumable" Status="Available" Dimension="595 842"/>)";
 
+// A Combined ticket without a layout: media (unless empty) and one run list of the partitions.
 std::string ticketXml(const std::string& partitions, const std::string& media = kMedia) {
-    return R"(<?xml version="1.0" encoding="UTF-8"?>
-<JDF xmlns="http://www.CIP4.org/JDFSchema_1_1" xmlns:eg="http://www.esko-graphics.com/EskoJDF" ID="n1" JobPartID="n1"
-     Type="Combined" Types="Interpreting Rendering DigitalPrinting" Status="Waiting" Version="1.3">
-  <ResourcePool>)" + media +
-           R"(<RunList ID="RL" Class="Parameter" Status="Available" PartIDKeys="Run">)" + partitions + R"(</RunList>
-  </ResourcePool>
-  <ResourceLinkPool>)" + std::string(media.empty() ? "" : R"(<MediaLink rRef="M" Usage="Input"/>)") +
-           R"(<RunListLink rRef="RL" Usage="Input" ProcessUsage="Document"/></ResourceLinkPool>
-</JDF>)";
-}
-
-std::string partition(int run, const std::string& url, const std::string& attributes = "") {
-    return "<RunList Run=\"" + std::to_string(run) + "\" " + attributes + "><LayoutElement><FileSpec URL=\"" + url +
-           "\"/></LayoutElement></RunList>";
+    return vorlan::test::jdfTicket(
+        media + vorlan::test::runListByRun("RL", partitions),
+        (media.empty() ? "" : R"(<MediaLink rRef="M" Usage="Input"/>)") +
+            std::string(R"(<RunListLink rRef="RL" Usage="Input" ProcessUsage="Document"/>)"),
+        R"(xmlns:eg="http://www.esko-graphics.com/EskoJDF" Type="Combined" Types="Interpreting Rendering DigitalPrinting")");
 }
 
 Job writeJob(const fs::path& root, const std::string& ticket) {
-    Job job{root, root / "job1.0001", root / "job1D0001", root / "job1.impinfo", root / "out.jdf"};
+    Job job = ticketJobAt(root);
     vorlan::test::writeFile(job.dataFile, "data file of job 1\n");
     vorlan::test::writeFile(job.dataFolder / "ticket.jdf", ticket);
     return job;
@@ -68,9 +61,9 @@ using LayoutInjection = vorlan::test::JobStoreTest;
 // Rows: a0 a1 a2 b0 b2 c0 c1 cut0.
 TEST_F(LayoutInjection, PartsFollowThePageRangeAndTheDieLine) {
     const std::string partitions =
-        partition(0, "./a.pdf", R"(NPage="3")") + partition(1, "b.pdf", R"(Pages="0 2")") +
-        partition(2, "dwc.pdf", R"(eg:DieContent="die CONTENT")") + partition(3, "c.pdf") +
-        partition(4, "die.pdf", R"(eg:DieContent="DIE")") + partition(5, "cut.pdf", R"(eg:DieContent="Cut")");
+        runPartition(0, "./a.pdf", R"(NPage="3")") + runPartition(1, "b.pdf", R"(Pages="0 2")") +
+        runPartition(2, "dwc.pdf", R"(eg:DieContent="die CONTENT")") + runPartition(3, "c.pdf", "") +
+        runPartition(4, "die.pdf", R"(eg:DieContent="DIE")") + runPartition(5, "cut.pdf", R"(eg:DieContent="Cut")");
     const PartText dwc{"dwc.pdf", "0", "1", "DieWithContent"}, die{"die.pdf", "0", "1", "DieOnly"};
     auto content = [](const char* file, const char* page) { return PartText{file, page, "1", "Content"}; };
     struct Case {
@@ -132,9 +125,9 @@ TEST_F(LayoutInjection, PartsFollowThePageRangeAndTheDieLine) {
 
 TEST_F(LayoutInjection, FilesAreFoundInTheDataFolderUnlessTheUrlIsAbsolute) {
     // No Media either: the injected sheets are 0 by 0.
-    const std::string ticket = ticketXml(partition(0, "sub/a.pdf") + partition(1, "http://example.com/x.pdf") +
-                                             partition(2, "file:///nowhere/y.pdf", R"(NPage="1")") +
-                                             partition(3, R"(file://H:\docs\z.pdf)", R"(NPage="1")"),
+    const std::string ticket = ticketXml(runPartition(0, "sub/a.pdf", "") + runPartition(1, "http://example.com/x.pdf", "") +
+                                             runPartition(2, "file:///nowhere/y.pdf", R"(NPage="1")") +
+                                             runPartition(3, R"(file://H:\docs\z.pdf)", R"(NPage="1")"),
                                          "");
     for (const char* range : {"All", "1-9"}) {
         SCOPED_TRACE(range);
@@ -159,7 +152,7 @@ TEST_F(LayoutInjection, FilesAreFoundInTheDataFolderUnlessTheUrlIsAbsolute) {
 
 TEST_F(LayoutInjection, FailuresAreReportedAndLeaveNoTicket) {
     // The new ticket cannot be saved.
-    Job job = writeJob(tmp.path(), ticketXml(partition(0, "a.pdf", R"(NPage="2")")));
+    Job job = writeJob(tmp.path(), ticketXml(runPartition(0, "a.pdf", R"(NPage="2")")));
     Job unwritable = job;
     unwritable.output = tmp / "missing-folder" / "out.jdf";
     EXPECT_EQ(consume(unwritable, "All", true), LD_JDF_WRITE_FAILED);
@@ -169,7 +162,7 @@ TEST_F(LayoutInjection, FailuresAreReportedAndLeaveNoTicket) {
     // A ticket that cannot be parsed (again), or none at all, and one claiming more pages than
     // a layout can be given.
     vorlan::test::writeFile(tmp / "broken.jdf", "<JDF");
-    vorlan::test::writeFile(tmp / "huge.jdf", ticketXml(partition(0, "a.pdf", R"(NPage="2000000000")")));
+    vorlan::test::writeFile(tmp / "huge.jdf", ticketXml(runPartition(0, "a.pdf", R"(NPage="2000000000")")));
     const std::pair<std::string, int32_t> tickets[] = {{"broken.jdf", 0}, {"", 0}, {"huge.jdf", 1}};
     for (const auto& [name, mode] : tickets) {
         LD_JDF w;

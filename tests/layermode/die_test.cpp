@@ -23,13 +23,6 @@ protected:
         setJobAttribute("KVPrintDieLine", "True");
     }
 
-    TicketView run(const Job& job, const char* pageRange = "All") {
-        EXPECT_EQ(consume(job, pageRange), 0);
-        if (!vorlan::test::corpusDir().empty()) {
-            EXPECT_EQ(schemaErrors({job.output}), "");
-        }
-        return TicketView(job.output);
-    }
     std::string dieInfo() { return vorlan::test::readFile(tmp / "job1.dieinfo"); }
 
     DieSpec die{true, "Die", "", 1};
@@ -42,7 +35,7 @@ TEST_F(DieCuts, OneSidedLayoutGainsTwoDieSheets) {
     TicketSpec shape;
     shape.twoSided = false;
     Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLayers, {}, &die));
-    TicketView t = run(job);
+    TicketView t = consumeAndRead(job);
     ASSERT_EQ(t.count("//Sheet"), 4u);
     EXPECT_EQ(t.count("//Sheet[@Name='DieSheet']"), 2u);
     auto withContent = t.one("//Sheet[3]/Surface");
@@ -64,7 +57,7 @@ TEST_F(DieCuts, OneSidedLayoutGainsTwoDieSheets) {
 TEST_F(DieCuts, TwoSidedLayoutGivesTwoSidedDieSheets) {
     VORLAN_REQUIRE_CORPUS();
     Job job = writeTicketJob(tmp.path(), TicketSpec{}, descriptionXml(kLayers, {}, &die));
-    TicketView t = run(job);
+    TicketView t = consumeAndRead(job);
     EXPECT_EQ(t.count("//Sheet[@Name='DieSheet']/Surface[@Side='Front']"), 2u);
     EXPECT_EQ(t.count("//Sheet[@Name='DieSheet']/Surface[@Side='Back'][@KAV_tkt:IsBackDie='true']"), 2u);
     // Both surfaces of the die-only sheet show the die alone, each its own page.
@@ -74,11 +67,30 @@ TEST_F(DieCuts, TwoSidedLayoutGivesTwoSidedDieSheets) {
     EXPECT_EQ(t.attr("//RunList[@Run='" + std::to_string(back) + "']", "Pages"), "1");
 }
 
+// Both objects of a one-sided sheet show page 0: each die sheet gets one row for both.
+TEST_F(DieCuts, DieSheetObjectsShowingOnePageShareOneRow) {
+    VORLAN_REQUIRE_CORPUS();
+    TicketSpec shape;
+    shape.sheets = 1;
+    shape.twoSided = false;
+    shape.extraOrd = 0;
+    Job job = writeTicketJob(tmp.path(), shape, descriptionXml(kLayers, {}, &die));
+    TicketView t = consumeAndRead(job);
+    ASSERT_EQ(t.count("//Sheet"), 3u);
+    EXPECT_EQ(t.count("//InterpretingParams[@Run]"), 3u);
+    for (const char* sheet : {"2", "3"}) {
+        auto objects = t.all(std::string("//Sheet[") + sheet + "]/Surface/ContentObject");
+        ASSERT_EQ(objects.size(), 2u) << sheet;
+        EXPECT_STREQ(objects[0].node().attribute("Ord").value(), objects[1].node().attribute("Ord").value()) << sheet;
+    }
+    EXPECT_EQ(t.attr("//Sheet[1]/Surface/ContentObject[2]", "Ord"), "0");  // the content sheet is untouched
+}
+
 TEST_F(DieCuts, DisabledDieOnlySwitchesTheDieOff) {
     VORLAN_REQUIRE_CORPUS();
     die.enable = false;
     Job job = writeTicketJob(tmp.path(), TicketSpec{}, descriptionXml(kLayers, {}, &die));
-    TicketView t = run(job);
+    TicketView t = consumeAndRead(job);
     EXPECT_EQ(t.count("//Sheet[@Name='DieSheet']"), 0u);
     EXPECT_EQ(t.switches(3), "+Art +KVVersionSpecialOCGName -Die");
 }
@@ -87,7 +99,7 @@ TEST_F(DieCuts, BarePdfDiePagesGetTheirOwnFileCopies) {
     VORLAN_REQUIRE_CORPUS();
     VersionSpec pages{"Pages", 1, true, {{0, {}}, {1, {}}, {2, {}}, {3, {}}}};
     Job job = writeBarePdfJob(tmp.path(), descriptionXml(kLayers, {pages}, &die, false));
-    TicketView t = run(job);
+    TicketView t = consumeAndRead(job);
     // Four content pages, die with content for pages 0 and 1, die alone for pages 0 and 1.
     EXPECT_EQ(t.count("//RunList[@Run]"), 8u);
     EXPECT_EQ(t.count("//RunList[@KAV_tkt:VersContentType='DieWithContent']"), 2u);
@@ -114,7 +126,7 @@ TEST_F(DieCuts, BarePdfWithItsDiePageDeselectedGetsNoDieRuns) {
     VORLAN_REQUIRE_CORPUS();
     VersionSpec pages{"Pages", 1, true, {{0, {}}}};
     Job job = writeBarePdfJob(tmp.path(), descriptionXml(kLayers, {pages}, &die, false));
-    TicketView t = run(job, "2");
+    TicketView t = consumeAndRead(job, "2");
     EXPECT_EQ(t.count("//RunList[@Run]"), 0u);
 }
 

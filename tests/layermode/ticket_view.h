@@ -8,6 +8,9 @@
 #include <gtest/gtest.h>
 #include <pugixml.hpp>
 
+#include "job_builder.h"
+#include "test_support.h"
+
 namespace layermode_test {
 
 class TicketView {
@@ -34,5 +37,16 @@ private:
     pugi::xml_document doc_;
     pugi::xml_parse_result loaded_;
 };
+
+// Runs the job and expects the result; on success the ticket is there and, where the corpus is,
+// valid against the JDF 1.8 schema; on failure no ticket is left. Returns the ticket to read back.
+inline TicketView consumeAndRead(const Job& job, const char* pageRange = "All", int expected = 0) {
+    EXPECT_EQ(consume(job, pageRange), expected);
+    EXPECT_EQ(std::filesystem::exists(job.output), expected == 0);
+    if (expected == 0 && !vorlan::test::corpusDir().empty()) {
+        EXPECT_EQ(schemaErrors({job.output}), "");
+    }
+    return TicketView(job.output);
+}
 
 }  // namespace layermode_test

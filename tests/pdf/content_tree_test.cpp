@@ -1,5 +1,6 @@
 // The content-element tree and its edits, proven by re-parsing and by rendering plates. Wrapping
-// in optional content, and forms painted per use, are proven by rendering in tests/pdfconvert.
+// in optional content, forms painted per use and colorants set to None in nested spaces are
+// proven by rendering in tests/pdfconvert.
 #include <gtest/gtest.h>
 
 #include <qpdf/QPDFWriter.hh>
@@ -69,24 +70,6 @@ TEST(ContentTree, ContainersLeavesAndStates) {
     EXPECT_EQ(content->bytes.substr(inlineImage.begin, 2), "BI");
     EXPECT_EQ(content->bytes.substr(inlineImage.end - 2, 2), "EI");
     EXPECT_EQ(inlineImage.ownSpace->family, ColourFamily::DeviceGray);
-}
-
-TEST(ContentEdit, ColorantsToNoneThroughNestedSpaces) {
-    TestPdf pdf;
-    auto gold = [](const std::string& c) { return c == "Gold"; };
-    QPDFObjectHandle sep = QPDFObjectHandle::parse(&pdf.qpdf(), pdf.separation("Gold"));
-    EXPECT_EQ(colorantsToNone(sep, gold).getArrayItem(1).getName(), "/None");
-    EXPECT_EQ(sep.getArrayItem(1).getName(), "/Gold");  // the original is left alone
-    QPDFObjectHandle other = QPDFObjectHandle::parse(&pdf.qpdf(), pdf.separation("Silver"));
-    EXPECT_TRUE(colorantsToNone(other, gold).isSameObjectAs(other));
-    QPDFObjectHandle nchannel = QPDFObjectHandle::parse(&pdf.qpdf(), pdf.deviceN({"Gold", "Cyan"}, true));
-    QPDFObjectHandle n2 = colorantsToNone(nchannel, gold);
-    EXPECT_EQ(n2.getArrayItem(1).unparse(), "[ /None /Cyan ]");
-    QPDFObjectHandle colorants = n2.getArrayItem(4).getKey("/Colorants");
-    EXPECT_FALSE(colorants.hasKey("/Gold"));
-    EXPECT_EQ(colorants.getKey("/None").getArrayItem(1).getName(), "/None");
-    QPDFObjectHandle indexed = QPDFObjectHandle::parse(&pdf.qpdf(), "[/Indexed " + pdf.separation("Gold") + " 1 <00FF>]");
-    EXPECT_EQ(colorantsToNone(indexed, gold).getArrayItem(1).getArrayItem(1).getName(), "/None");
 }
 
 // Removing the Gold group and a text run: the plates lose exactly that ink, and the removed

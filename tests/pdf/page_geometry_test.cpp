@@ -36,20 +36,6 @@ std::string onePage(const TempDir& dir, const TestPdf::PageOptions& options) {
 
 }  // namespace
 
-TEST(PdfInspection, CountsPagesAndStartsTheSessionOnce) {
-    TempDir dir;
-    TestPdf pdf;
-    for (int i = 0; i < 3; ++i) pdf.addPage("0 0 m 1 1 l S");
-    std::string path = (dir / "three.pdf").string();
-    pdf.write(path);
-    Context ctx;
-    EXPECT_FALSE(ctx.fs->pdfLibraryStarted);
-    EXPECT_EQ(getPDFPageCount(ctx.fs, path.c_str()), 3);
-    EXPECT_TRUE(ctx.fs->pdfLibraryStarted);
-    destroyZippedJDFFileSystem(ctx.fs);
-    ctx.fs = nullptr;
-}
-
 TEST(PdfInspection, FirstPageSizeFollowsRotationAndBoxes) {
     struct Case {
         int rotate;

@@ -103,14 +103,18 @@ void TestPdf::write(const std::string& path) {
     writer.write();
 }
 
-void writeSpotPdf(const std::string& path, const std::vector<std::string>& inks, int pages) {
+void writeSpotPdf(const std::string& path, const std::vector<std::vector<std::string>>& pageInks,
+                  const std::string& xmp) {
     TestPdf pdf;
-    std::string spaces, content = "0 0 0 1 k 10 10 20 20 re f\n";
-    for (size_t i = 0; i < inks.size(); ++i) {
-        spaces += "/S" + std::to_string(i) + " " + pdf.separation(inks[i]) + " ";
-        content += "/S" + std::to_string(i) + " cs 1 sc " + std::to_string(40 + 30 * i) + " 10 20 20 re f\n";
+    for (const std::vector<std::string>& inks : pageInks) {
+        std::string spaces, content = "0 0 0 1 k 10 10 20 20 re f\n";
+        for (size_t i = 0; i < inks.size(); ++i) {
+            spaces += "/S" + std::to_string(i) + " " + pdf.separation(inks[i]) + " ";
+            content += "/S" + std::to_string(i) + " cs 1 sc " + std::to_string(40 + 30 * i) + " 10 20 20 re f\n";
+        }
+        pdf.addPage(content, "<< /ColorSpace << " + spaces + ">> >>");
     }
-    for (int p = 0; p < pages; ++p) pdf.addPage(content, "<< /ColorSpace << " + spaces + ">> >>");
+    if (!xmp.empty()) pdf.setXmp(xmp);
     pdf.write(path);
 }
 

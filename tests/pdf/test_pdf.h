@@ -58,8 +58,14 @@ struct TestInk {
 };
 std::string eskoXmp(const std::vector<TestInk>& inks);
 
-// Writes a PDF whose every page paints each ink in a square of its own, plus a CMYK square.
-void writeSpotPdf(const std::string& path, const std::vector<std::string>& inks, int pages);
+// Writes a PDF whose pages each paint their inks (one list a page) in squares of their own beside
+// a black CMYK square, with the XMP packet when one is given.
+void writeSpotPdf(const std::string& path, const std::vector<std::vector<std::string>>& pageInks,
+                  const std::string& xmp = "");
+// The same inks on that many pages.
+inline std::vector<std::vector<std::string>> samePages(const std::vector<std::string>& inks, int pages) {
+    return std::vector<std::vector<std::string>>(static_cast<size_t>(pages), inks);
+}
 
 // A PDF name token for a decoded name (with #xx escapes where needed).
 std::string pdfName(const std::string& name);

@@ -25,17 +25,11 @@ std::vector<XMPInk> read(const std::string& packet, bool expected = true) {
     return inks;
 }
 
-// A PDF of `pages` pages with a spot per page (the page's name) and an optional XMP packet.
-std::string makePdf(const TempDir& dir, const std::vector<std::string>& pageSpots, const std::string& xmp,
+// A PDF whose pages paint the given inks, with an optional XMP packet.
+std::string makePdf(const TempDir& dir, const std::vector<std::vector<std::string>>& pageInks, const std::string& xmp,
                     const char* name = "in.pdf") {
-    TestPdf pdf;
-    for (const std::string& spot : pageSpots) {
-        std::string resources = "<< /ColorSpace << /CS0 " + pdf.separation(spot) + " >> >>";
-        pdf.addPage("/CS0 cs 1 scn 0 0 10 10 re f 0 0 0 1 k 1 1 2 2 re f", resources);
-    }
-    if (!xmp.empty()) pdf.setXmp(xmp);
-    std::string path = (dir / name).string();
-    pdf.write(path);
+    const std::string path = (dir / name).string();
+    vorlan::test::writeSpotPdf(path, pageInks, xmp);
     return path;
 }
 
@@ -107,22 +101,9 @@ TEST(XmpInks, ShapeOfTheList) {
     EXPECT_FALSE(readXMPInks(nullptr, none));
 }
 
-TEST(XmpInks, CollectsTechnicalAndDieInksFromTheFile) {
-    TempDir dir;
-    std::string path = makePdf(dir, {"Gold"}, vorlan::test::eskoXmp({{"Gold", "pantone", "normal"},
-                                                                     {"Varnish", "designer", "varnish"},
-                                                                     {"Die", "designer", "technical"}}));
-    std::vector<std::string> technical, die;
-    collectEskoTechnicalInks(path.c_str(), technical, die);
-    EXPECT_EQ(technical, (std::vector<std::string>{"Varnish", "Die"}));
-    EXPECT_EQ(die, (std::vector<std::string>{"Die"}));
-    collectEskoTechnicalInks((dir / "missing.pdf").c_str(), technical, die);
-    EXPECT_EQ(technical.size(), 2u);
-}
-
 TEST(XmpScan, EskoModeWritesTechnicalVersionAndDieCut) {
     TempDir dir;
-    std::string pdf = makePdf(dir, {"Gold", "Gold", "Gold"},
+    std::string pdf = makePdf(dir, vorlan::test::samePages({"Gold"}, 3),
                               vorlan::test::eskoXmp({{"cyan", "process", "normal"},
                                                      {"Gloss", "designer", "varnish"},
                                                      {"Cut & \"Crease\"", "designer", "technical"}}));
@@ -140,15 +121,15 @@ TEST(XmpScan, EskoModeEdgeCases) {
     TempDir dir;
     std::string out = (dir / "out.impinfo").string();
     // Only varnish: no die cut.
-    std::string varnish = makePdf(dir, {"A"}, vorlan::test::eskoXmp({{"Gloss", "designer", "varnish"}}), "v.pdf");
+    std::string varnish = makePdf(dir, {{"A"}}, vorlan::test::eskoXmp({{"Gloss", "designer", "varnish"}}), "v.pdf");
     EXPECT_EQ(scanPdfInksToDescription(varnish.c_str(), out.data(), false), 1);
     std::string text = vorlan::test::readFile(out);
     EXPECT_NE(text.find("SepNameOff=\"Gloss\""), std::string::npos);
     EXPECT_EQ(text.find("DieCut"), std::string::npos);
     std::filesystem::remove(out);
     // Normal and opaque inks only, no XMP, a missing or damaged file: nothing written, result 1.
-    std::string normal = makePdf(dir, {"A"}, vorlan::test::eskoXmp({{"A", "pantone", "normal"}, {"W", "designer", "opaque"}}), "n.pdf");
-    std::string bare = makePdf(dir, {"A"}, "", "bare.pdf");
+    std::string normal = makePdf(dir, {{"A"}}, vorlan::test::eskoXmp({{"A", "pantone", "normal"}, {"W", "designer", "opaque"}}), "n.pdf");
+    std::string bare = makePdf(dir, {{"A"}}, "", "bare.pdf");
     vorlan::test::writeFile(dir / "junk.pdf", "%PDF-1.4\njunk");
     for (std::string in : {normal, bare, (dir / "missing.pdf").string(), (dir / "junk.pdf").string()}) {
         EXPECT_EQ(scanPdfInksToDescription(in.c_str(), out.data(), false), 1);
@@ -163,7 +144,7 @@ TEST(XmpScan, EskoModeEdgeCases) {
 TEST(XmpScan, DieLibraryModeMatchesPageInksAgainstSeparations) {
     TempDir dir;
     DieLibraryHome home(kLibrary);
-    std::string pdf = makePdf(dir, {"Die", "Gold", "Die", "LayerDie", "Crease"}, "");
+    std::string pdf = makePdf(dir, {{"Die"}, {"Gold"}, {"Die"}, {"LayerDie"}, {"Crease"}}, "");
     std::string out = (dir / "die.impinfo").string();
     EXPECT_EQ(scanPdfInksToDescription(pdf.c_str(), out.data(), true), 2);
     std::string text = vorlan::test::readFile(out);
@@ -175,18 +156,8 @@ TEST(XmpScan, DieLibraryModeMatchesPageInksAgainstSeparations) {
     EXPECT_EQ(attributeValues(text, "Surface", "index").size(), 6u);  // five pages and the die cut
 
     std::filesystem::remove(out);
-    std::string none = makePdf(dir, {"Gold"}, "", "none.pdf");
+    std::string none = makePdf(dir, {{"Gold"}}, "", "none.pdf");
     EXPECT_EQ(scanPdfInksToDescription(none.c_str(), out.data(), true), 2);
     EXPECT_FALSE(std::filesystem::exists(out));
 }
 
-TEST(XmpScan, DieLibraryModeWithoutUsableLibrary) {
-    TempDir dir;
-    std::string pdf = makePdf(dir, {"Die"}, ""), out = (dir / "die.impinfo").string();
-    for (const char* library : {"<AutoDieLibrary><Separations><Separation Name=\"Die\">",  // not well-formed
-                                "<OtherRoot><Separations><Separation Name=\"Die\"/></Separations></OtherRoot>"}) {
-        DieLibraryHome home(library);
-        EXPECT_EQ(scanPdfInksToDescription(pdf.c_str(), out.data(), true), 2);
-        EXPECT_FALSE(std::filesystem::exists(out));
-    }
-}

@@ -1,15 +1,13 @@
-// The worker's conversion of a job's PDFs: which PDFs are converted, the paths the host names,
-// the separations collected from the first version and a single die cut, and the failure result.
+// The worker's conversion of a job's PDFs: the separations collected from the first version and a
+// single die cut, and the failure result. Which PDFs a job converts, into the paths its host names,
+// is checked end to end by the proof and command-line tests.
 #include <gtest/gtest.h>
 
 #include <cwchar>
 #include <string>
 #include <vector>
 
-#include "pdf/optional_content.h"
-#include "pdf/separation_layers.h"
 #include "platform/os/text.h"
-#include "render.h"
 #include "test_pdf.h"
 #include "test_support.h"
 #include "vorlan/LD_JDF.h"
@@ -82,14 +80,6 @@ std::string narrow(const wchar_t* text) { return vorlan::os::narrow(text); }
 
 }  // namespace
 
-TEST(ConvertAllPDFs, EmptyMapSucceedsWithoutAskingForPaths) {
-    Job job;
-    job.worker.lastError = LD_FAILED;
-    EXPECT_EQ(job.worker.convertAllPDFs(), LD_OK);
-    EXPECT_EQ(job.worker.JDF_GetLastErrorCode(), LD_OK);
-    EXPECT_EQ(job.host.calls, 0u);
-}
-
 TEST(ConvertAllPDFs, SeparationsComeFromTheFirstVersionAndASingleDieCut) {
     Job job;
     job.switchOff({L"Gold", L"gold", L"Silver"});
@@ -105,35 +95,6 @@ TEST(ConvertAllPDFs, SeparationsComeFromTheFirstVersionAndASingleDieCut) {
     names.clear();
     job.worker.getListOfSeparationsToBeConverted(names);
     EXPECT_EQ(names.size(), 2u);
-}
-
-TEST(ConvertAllPDFs, ConvertsIntoTheHostsPathAndRecordsIt) {
-    Job job;
-    job.switchOff({L"Gold"});
-    LD_PDF* pdf = job.addPdf();
-    const std::string out = (job.dir / "sub" / "converted.pdf").string();
-    job.host.answers = {out};
-    EXPECT_EQ(job.worker.convertAllPDFs(), LD_OK);
-    EXPECT_TRUE(pdf->converted);
-    EXPECT_EQ(narrow(pdf->convertedPath), out);
-    EXPECT_EQ(vorlan::test::groupOrder(out), (std::vector<std::string>{"Gold", vorlan::pdf::kSpecialOCGName}));
-    EXPECT_TRUE(vorlan::test::qpdfCheckPasses(out));
-}
-
-TEST(ConvertAllPDFs, PlainLayersNeedADieCutToBeConverted) {
-    Job job;
-    LD_PDF* pdf = job.addPdf({L"Layer 1"});
-    const std::string out = (job.dir / "a.pdf").string();
-    job.host.answers = {out, out};
-    EXPECT_EQ(job.worker.convertAllPDFs(), LD_OK);
-    EXPECT_FALSE(pdf->converted);
-    EXPECT_EQ(narrow(pdf->convertedPath), out) << "the path is kept even when nothing is converted";
-    EXPECT_FALSE(std::filesystem::exists(out));
-
-    job.addDieCut({});
-    EXPECT_EQ(job.worker.convertAllPDFs(), LD_OK);
-    EXPECT_TRUE(pdf->converted);
-    EXPECT_EQ(vorlan::test::groupOrder(out), (std::vector<std::string>{vorlan::pdf::kSpecialOCGName}));
 }
 
 TEST(ConvertAllPDFs, FirstFailureStopsWithConversionFailed) {

@@ -84,25 +84,20 @@ std::string ticketFor(const std::vector<Placement>& placements) {
     int ords[2] = {0, 0};
     for (size_t i = 0; i < placements.size(); ++i) {
         const Placement& p = placements[i];
-        const std::string ord = std::to_string(ords[p.mark]++);
-        runs[p.mark] += "<RunList Run=\"" + ord + "\" Pages=\"" + std::to_string(p.page) +
-                        "\"><LayoutElement><FileSpec URL=\"" + p.file +
-                        "\" MimeType=\"application/pdf\"/></LayoutElement></RunList>\n";
+        const int ord = ords[p.mark]++;
+        runs[p.mark] += vorlan::test::runPartition(ord, p.file, "Pages=\"" + std::to_string(p.page) + "\"");
         sheets += "<Sheet Name=\"S" + std::to_string(i) + "\"><Media Dimension=\"400 400\"/><Surface Side=\"Front\" "
                   "KAV_tkt:VersionName=\"" + p.version + "\" KAV_tkt:VersionCopyCount=\"1\"><" +
-                  (p.mark ? "MarkObject" : "ContentObject") + " CTM=\"" + p.ctm + "\" Ord=\"" + ord + "\"" +
+                  (p.mark ? "MarkObject" : "ContentObject") + " CTM=\"" + p.ctm + "\" Ord=\"" + std::to_string(ord) + "\"" +
                   (p.clipBox.empty() ? "" : " ClipBox=\"" + p.clipBox + "\"") + "/></Surface></Sheet>\n";
     }
-    return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
-           "<JDF xmlns=\"http://www.CIP4.org/JDFSchema_1_1\" xmlns:KAV_tkt=\"http://www.vorlan.org/JDF/ticket/1.0\" "
-           "ID=\"n1\" JobPartID=\"n1\" Type=\"Imposition\" Status=\"Waiting\" Version=\"1.3\"><ResourcePool>\n"
-           "<RunList ID=\"rDoc\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n" + runs[0] +
-           "</RunList><RunList ID=\"rMarks\" Class=\"Parameter\" Status=\"Available\" PartIDKeys=\"Run\">\n" + runs[1] +
-           "</RunList><Layout ID=\"rLayout\" Class=\"Parameter\" Status=\"Available\"><Signature Name=\"Sig1\">\n" +
-           sheets + "</Signature></Layout></ResourcePool><ResourceLinkPool>"
-           "<RunListLink rRef=\"rDoc\" Usage=\"Input\" ProcessUsage=\"Document\"/>"
-           "<RunListLink rRef=\"rMarks\" Usage=\"Input\" ProcessUsage=\"Marks\"/>"
-           "<LayoutLink rRef=\"rLayout\" Usage=\"Input\"/></ResourceLinkPool></JDF>\n";
+    return vorlan::test::jdfTicket(
+        vorlan::test::runListByRun("rDoc", runs[0]) + vorlan::test::runListByRun("rMarks", runs[1]) +
+            R"(<Layout ID="rLayout" Class="Parameter" Status="Available"><Signature Name="Sig1">)" + sheets +
+            "</Signature></Layout>",
+        R"(<RunListLink rRef="rDoc" Usage="Input" ProcessUsage="Document"/>)"
+        R"(<RunListLink rRef="rMarks" Usage="Input" ProcessUsage="Marks"/><LayoutLink rRef="rLayout" Usage="Input"/>)",
+        R"(xmlns:KAV_tkt="http://www.vorlan.org/JDF/ticket/1.0" Type="Imposition")");
 }
 
 class Proofs : public vorlan::test::JobStoreTest {

@@ -59,6 +59,27 @@ int xpathCount(const std::filesystem::path& file, const std::string& xpath);
 // cross-reference table.
 std::string handWrittenPdf(const std::vector<std::string>& objects);
 
+// A JDF root with the given attributes around a resource pool and a link pool.
+inline std::string jdfTicket(const std::string& resources, const std::string& links = "",
+                             const std::string& rootAttributes = R"(Type="Imposition")") {
+    return R"(<?xml version="1.0" encoding="UTF-8"?>
+<JDF xmlns="http://www.CIP4.org/JDFSchema_1_1" ID="n1" JobPartID="p1" Status="Waiting" Version="1.3" )" +
+           rootAttributes + ">\n<ResourcePool>\n" + resources + "\n</ResourcePool>\n<ResourceLinkPool>\n" + links +
+           "\n</ResourceLinkPool>\n</JDF>\n";
+}
+
+// A RunList partitioned by Run with one partition per file (NPage pages each).
+inline std::string runListByRun(const std::string& id, const std::string& partitions) {
+    return R"(<RunList ID=")" + id + R"(" Class="Parameter" Status="Available" PartIDKeys="Run">)" + partitions +
+           "</RunList>";
+}
+
+inline std::string runPartition(int run, const std::string& url, const std::string& pageAttributes,
+                                const std::string& extra = "") {
+    return R"(<RunList Run=")" + std::to_string(run) + "\" " + pageAttributes + " " + extra +
+           R"(><LayoutElement><FileSpec URL=")" + url + R"(" MimeType="Application/PDF"/></LayoutElement></RunList>)";
+}
+
 // A test with a temporary folder (tmp) that holds the job attribute store the library uses
 // while the test runs (VORLAN_JOB_STORE).
 class JobStoreTest : public testing::Test {

@@ -22,22 +22,6 @@ using vorlan::test::DieLibraryHome;
 
 namespace {
 
-// Writes a PDF whose pages paint the given spot inks (one list per page) beside a black square.
-void writePdf(const fs::path& path, const std::vector<std::vector<std::string>>& pages, const std::string& xmp) {
-    vorlan::test::TestPdf pdf;
-    for (const std::vector<std::string>& spots : pages) {
-        std::string resources = "<< /ColorSpace << ", content = "0 0 0 1 k 0 0 20 20 re f ";
-        for (size_t i = 0; i < spots.size(); ++i) {
-            const std::string cs = "/CS" + std::to_string(i);
-            resources += cs + " " + pdf.separation(spots[i]) + " ";
-            content += cs + " cs 1 scn " + std::to_string(30 + 30 * i) + " 0 20 20 re f ";
-        }
-        pdf.addPage(content, resources + ">> >>");
-    }
-    if (!xmp.empty()) pdf.setXmp(xmp);
-    pdf.write(path.string());
-}
-
 std::string joined(const std::vector<wchar_t*>& names) {
     std::string text;
     for (const wchar_t* name : names) text += (text.empty() ? "" : ",") + vorlan::os::toUtf8(name);
@@ -79,7 +63,7 @@ public:
     ~ThreePdfJob() { unsetenv("VORLAN_JOB_STORE"); }
 
     void pdf(const char* name, const std::vector<std::vector<std::string>>& pages, const std::string& xmp = "") {
-        writePdf(job.dataFolder / name, pages, xmp);
+        vorlan::test::writeSpotPdf((job.dataFolder / name).string(), pages, xmp);
     }
 
     // Runs the pipeline (job 1) without a description from the host; the worker keeps what it read.
@@ -109,7 +93,8 @@ public:
 }  // namespace
 
 // a.pdf has no ink list but still counts, so the layers of b and c carry pdfIndex 1 and 2; names XML
-// must escape come back unchanged; the die inks of both PDFs are sorted, each once.
+// must escape come back unchanged through the written file; the die inks of both PDFs are
+// sorted, each once.
 TEST(AutoDescription, EskoInksOfThreePdfs) {
     ThreePdfJob t;
     const Job& job = t.job;
@@ -137,25 +122,6 @@ TEST(AutoDescription, EskoInksOfThreePdfs) {
     EXPECT_EQ(vorlan::test::readFile(job.description), "the host's own description");
     for (const fs::directory_entry& entry : fs::directory_iterator(job.root))
         EXPECT_EQ(entry.path().filename().string().find(".impinfo."), std::string::npos) << entry.path();
-
-    const std::string esc = "Cut &quot;&lt;&amp;&gt;&quot;";
-    const std::string layer = "\" isSep=\"true\"/>\r\n";
-    std::string expected =
-        "<?xml version=\"1.0\" encoding=\"UTF-8\" standalone=\"no\" ?>\r\n<OptionalContentGroupData>\r\n"
-        "<OptionalLayer pdfIndex=\"1\" OCGName=\"Gloss\" displayName=\"Gloss" + layer +
-        "<OptionalLayer pdfIndex=\"1\" OCGName=\"Zeta\" displayName=\"Zeta" + layer +
-        "<OptionalLayer pdfIndex=\"1\" OCGName=\"Alpha\" displayName=\"Alpha" + layer +
-        "<OptionalLayer pdfIndex=\"2\" OCGName=\"Alpha\" displayName=\"Alpha" + layer +
-        "<OptionalLayer pdfIndex=\"2\" OCGName=\"" + esc + "\" displayName=\"" + esc + layer +
-        "<Versions>\r\n<Version enable=\"true\" name=\"EskoTechnicalVersion\">\r\n";
-    const std::string off[] = {"", "", "Gloss,Zeta,Alpha", "Gloss,Zeta,Alpha", "Alpha," + esc, "Alpha," + esc};
-    for (int s = 0; s < 6; ++s)
-        expected += "<Surface index=\" " + std::to_string(s) + " \">\r\n<ContentObject index=\"" + std::to_string(s) +
-                    "\" SepNameOff=\"" + off[s] + "\"/>\r\n</Surface>\r\n";
-    expected += "</Version>\r\n</Versions>\r\n<DieCut enable=\"true\" name=\"AutoDie\">\r\n"
-                "<Surface index=\"0\" dieSepInternalNames=\"Alpha," + esc + ",Zeta\"/>\r\n</DieCut>\r\n"
-                "</OptionalContentGroupData>\r\n";
-    EXPECT_EQ(t.generated(*worker), expected);
 }
 
 // The die library is read only when KVAutoDieControl is "True"; a library that yields no die ink
@@ -217,7 +183,8 @@ TEST(AutoDescriptionPlates, FirstVariantLeavesTheDiePlateBlank) {
         vorlan::test::TempDir dir;
         setenv("VORLAN_JOB_STORE", (dir / "store").c_str(), 1);
         Job job = writeTicketJob(dir.path(), TicketSpec{}, "");  // four content pages of content.pdf
-        writePdf(job.dataFolder / "content.pdf", std::vector<std::vector<std::string>>(4, {"Gold", "Die"}), c.xmp);
+        vorlan::test::writeSpotPdf((job.dataFolder / "content.pdf").string(), vorlan::test::samePages({"Gold", "Die"}, 4),
+                                   c.xmp);
         if (c.autoDieControl) setJobAttribute("KVAutoDieControl", c.autoDieControl);
         const int result = consume(job, "All", true);
         unsetenv("VORLAN_JOB_STORE");

@@ -40,56 +40,46 @@ protected:
         ASSERT_EQ(read(description(layerMode, dieCuts)), LD_OK);
         ASSERT_EQ(worker.applyClientModeChangesToXMLBufferData(), LD_OK);
     }
-    const XMLContentObjectData& object() { return *worker.versions.at(0)->surfaces.at(0)->contentObjects.at(0); }
 };
 
-TEST_F(ClientModeTest, SeparationModeWithoutDieDropsEveryLayer) {
-    readAndPrune(false, "");
-    EXPECT_TRUE(object().layerNameOn.empty() && object().layerNameOff.empty());
-    EXPECT_EQ(names(object().sepNameOn), Names{L"Cyan"});
-    EXPECT_EQ(names(object().sepNameOff), Names{L"White"});
-    XMLLayerData& record = layers(nullptr);
-    EXPECT_TRUE(record.layerOCGNames.empty() && record.layerDisplayNames.empty());
-    // Without a die the default switches stay (the ticket writes them); separation data is untouched.
-    EXPECT_EQ(names(record.defaultOnOCGNames), (Names{L"Base", L"Cyan"}));
-    EXPECT_EQ(names(record.defaultOffOCGNames), (Names{L"Cut", L"CutContour", L"White"}));
-    EXPECT_EQ(names(record.sepOCGNames), (Names{L"Cyan", L"CutContour", L"White"}));
-    EXPECT_EQ(names(record.sepDisplayNames), (Names{L"C", L"Contour", L"W"}));
-    EXPECT_EQ(names(record.nestedLayerOCGNames), Names{L"Inner"});  // nested lists stay
+std::string joined(const std::vector<wchar_t*>& list) {
+    std::string text;
+    for (const std::wstring& name : names(list)) text += (text.empty() ? "" : ",") + std::string(name.begin(), name.end());
+    return text;
 }
 
-TEST_F(ClientModeTest, SeparationModeKeepsTheDieLayers) {
-    readAndPrune(false, kContourDie);
-    XMLLayerData& record = layers(nullptr);
-    EXPECT_EQ(names(record.layerOCGNames), Names{L"Cut"});
-    EXPECT_EQ(names(record.layerDisplayNames), Names{L"Die line"});
-    EXPECT_EQ(names(record.defaultOnOCGNames), Names{L"Cyan"});
-    EXPECT_EQ(names(record.defaultOffOCGNames), (Names{L"Cut", L"CutContour", L"White"}));
-    EXPECT_TRUE(object().layerNameOff.empty());  // version switches go even for die layers
-    EXPECT_EQ(worker.m_XMLDieCuts.size(), 2u);   // die cuts themselves stay
-}
-
-TEST_F(ClientModeTest, LayerModeWithDieKeepsOnlyTheFirstDiesSeparations) {
-    readAndPrune(true, kContourDie);
-    EXPECT_TRUE(object().sepNameOn.empty() && object().sepNameOff.empty());
-    EXPECT_EQ(names(object().layerNameOn), Names{L"Base"});
-    EXPECT_EQ(names(object().layerNameOff), Names{L"Cut"});
-    XMLLayerData& record = layers(nullptr);
-    // CutContour matches ignoring case; White is named only by the second die cut and goes.
-    EXPECT_EQ(names(record.sepOCGNames), Names{L"CutContour"});
-    EXPECT_EQ(names(record.sepDisplayNames), Names{L"Contour"});
-    EXPECT_EQ(names(record.defaultOnOCGNames), Names{L"Base"});
-    EXPECT_EQ(names(record.defaultOffOCGNames), (Names{L"Cut", L"CutContour"}));
-    EXPECT_EQ(names(record.layerOCGNames), (Names{L"Base", L"Cut"}));
-    EXPECT_EQ(names(record.nestedSepOCGNames), Names{L"Spot"});
-}
-
-TEST_F(ClientModeTest, LayerModeWithoutDieDropsEverySeparation) {
-    readAndPrune(true, "");
-    XMLLayerData& record = layers(nullptr);
-    EXPECT_TRUE(record.sepOCGNames.empty() && record.sepDisplayNames.empty());
-    EXPECT_EQ(names(record.defaultOnOCGNames), (Names{L"Base", L"Cyan"}));
-    EXPECT_EQ(names(record.defaultOffOCGNames), (Names{L"Cut", L"CutContour", L"White"}));
+// Separation mode drops every layer (but the first die cut's), layer mode every separation
+// (but the first die cut's, matched ignoring case; White is named only by the second). Version
+// switches of the dropped kind go even for die names; defaults change only with a die; nested
+// lists and the die cuts themselves stay.
+TEST_F(ClientModeTest, EachModeDropsTheOtherKindExceptTheFirstDiesNames) {
+    const struct {
+        bool layerMode;
+        const char* dieCuts;
+        const char *switches, *layers, *separations, *defaultOn, *defaultOff;
+    } cases[] = {
+        {false, "", "|;Cyan|White", "/", "Cyan,CutContour,White/C,Contour,W", "Base,Cyan", "Cut,CutContour,White"},
+        {false, kContourDie, "|;Cyan|White", "Cut/Die line", "Cyan,CutContour,White/C,Contour,W", "Cyan",
+         "Cut,CutContour,White"},
+        {true, kContourDie, "Base|Cut;|", "Base,Cut/Base art,Die line", "CutContour/Contour", "Base", "Cut,CutContour"},
+        {true, "", "Base|Cut;|", "Base,Cut/Base art,Die line", "/", "Base,Cyan", "Cut,CutContour,White"},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(std::string(c.layerMode ? "layer mode" : "separation mode") + (*c.dieCuts ? " with die" : ""));
+        worker = LD_JDF();
+        readAndPrune(c.layerMode, c.dieCuts);
+        const XMLContentObjectData& object = *worker.versions.at(0)->surfaces.at(0)->contentObjects.at(0);
+        EXPECT_EQ(joined(object.layerNameOn) + "|" + joined(object.layerNameOff) + ";" + joined(object.sepNameOn) + "|" +
+                      joined(object.sepNameOff),
+                  c.switches);
+        XMLLayerData& record = layers(nullptr);
+        EXPECT_EQ(joined(record.layerOCGNames) + "/" + joined(record.layerDisplayNames), c.layers);
+        EXPECT_EQ(joined(record.sepOCGNames) + "/" + joined(record.sepDisplayNames), c.separations);
+        EXPECT_EQ(joined(record.defaultOnOCGNames), c.defaultOn);
+        EXPECT_EQ(joined(record.defaultOffOCGNames), c.defaultOff);
+        EXPECT_EQ(joined(record.nestedLayerOCGNames) + joined(record.nestedSepOCGNames), "InnerSpot");
+        EXPECT_EQ(worker.m_XMLDieCuts.size(), *c.dieCuts ? 2u : 0u);
+    }
 }
 
 TEST_F(ClientModeTest, ANameTwiceInADefaultListLosesOnlyOneEntry) {
