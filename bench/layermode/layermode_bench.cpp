@@ -5,12 +5,15 @@
 // imposition tools write them). Each job runs through vorlan_consume_job in a fresh process, so
 // its time and peak memory are its own.
 //
-//     layermode_bench [--shape pages|one-run|both] [--sizes 1000,10000] [--keep]
+//     layermode_bench [--shape pages|one-run|both] [--sizes 1000,10000] [--runs 3] [--keep]
+//
+// Each size runs --runs times; the best CPU time and the highest peak memory count.
 //
 // Goals: 10x the job in at most 10.5x the time (each size against the first), and peak memory at
 // most 4x the output ticket's size. Exit status 1 when a goal does not hold, 2 when a job fails.
 #include <unistd.h>
 
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -89,12 +92,14 @@ int main(int argc, char** argv) {
     std::string shapes = "both";
     std::vector<int> sizes = {1000, 10000};
     bool keep = false;
+    int runs = 3;
     for (int i = 1; i < argc; ++i) {
         if (!std::strcmp(argv[i], "--shape") && i + 1 < argc) shapes = argv[++i];
         else if (!std::strcmp(argv[i], "--sizes") && i + 1 < argc) sizes = sizesFrom(argv[++i]);
         else if (!std::strcmp(argv[i], "--keep")) keep = true;
+        else if (!std::strcmp(argv[i], "--runs") && i + 1 < argc) runs = std::max(1, std::atoi(argv[++i]));
         else {
-            std::fprintf(stderr, "usage: layermode_bench [--shape pages|one-run|both] [--sizes N,N...] [--keep]\n");
+            std::fprintf(stderr, "usage: layermode_bench [--shape pages|one-run|both] [--sizes N,N...] [--runs N] [--keep]\n");
             return 2;
         }
     }
@@ -109,12 +114,20 @@ int main(int argc, char** argv) {
         for (size_t k = 0; k < sizes.size(); ++k) {
             const fs::path root = fs::temp_directory_path() /
                                   ("vorlan-layermode-bench-" + std::to_string(getpid()) + "-" + std::to_string(k));
-            fs::remove_all(root);
-            const Result r = measure(self.c_str(), root, sizes[k], pages);
-            if (!keep) fs::remove_all(root);
-            if (r.run.status != 0) {
-                std::printf("%-8s %9d  job failed with status %d\n", pages ? "pages" : "one-run", sizes[k], r.run.status);
-                return 2;
+            // Best time of the runs (the least disturbed by other load), highest peak memory.
+            Result r;
+            for (int run = 0; run < runs; ++run) {
+                fs::remove_all(root);
+                const Result one = measure(self.c_str(), root, sizes[k], pages);
+                if (!keep || run + 1 < runs) fs::remove_all(root);
+                if (one.run.status != 0) {
+                    std::printf("%-8s %9d  job failed with status %d\n", pages ? "pages" : "one-run", sizes[k],
+                                one.run.status);
+                    return 2;
+                }
+                const long peak = std::max(r.run.peakKb, one.run.peakKb);
+                if (run == 0 || one.run.cpuSeconds < r.run.cpuSeconds) r = one;
+                r.run.peakKb = peak;
             }
             const double peakMb = static_cast<double>(r.run.peakKb) / 1024;
             const double perTicket = peakMb / r.ticketMb;

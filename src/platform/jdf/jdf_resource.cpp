@@ -66,15 +66,33 @@ int JDFResource::GetSide() const { return Tables::Number(Tables::Side, GetAttrib
 
 void JDFResource::SetSide(int side) { SetEnumAttribute(L"Side", side, Tables::Side); }
 
-JDFResource JDFResource::GetResourceRoot() const {
-    KElement e = *this;
-    WString name = GetNodeName();
-    while (!e.isNull()) {
-        KElement parent = e.GetParentNode();
-        if (parent.isNull() || parent.GetNodeName() != name) break;
-        e = parent;
+namespace {
+
+// The outermost element of the same name above n, n included: the root of n's partitions.
+pugi::xml_node partitionRoot(pugi::xml_node n) {
+    while (n && n.parent().type() == pugi::node_element && std::strcmp(n.parent().name(), n.name()) == 0)
+        n = n.parent();
+    return n;
+}
+
+// Whether a whitespace-separated list holds key (keys are ASCII tokens; any other never matches).
+bool listsToken(const char* list, const WString& key) {
+    for (const char* p = list; *p;) {
+        while (*p == ' ' || *p == '\t' || *p == '\n' || *p == '\r') ++p;
+        size_t i = 0;
+        while (i < key.size() && p[i] && static_cast<unsigned char>(p[i]) == static_cast<unsigned>(key[i])) ++i;
+        if (i == key.size() && (p[i] == '\0' || p[i] == ' ' || p[i] == '\t' || p[i] == '\n' || p[i] == '\r'))
+            return true;
+        while (*p && *p != ' ' && *p != '\t' && *p != '\n' && *p != '\r') ++p;
     }
-    return e;
+    return false;
+}
+
+}  // namespace
+
+JDFResource JDFResource::GetResourceRoot() const {
+    if (isNull()) return {};
+    return wrap(partitionRoot(node_));
 }
 
 bool JDFResource::IsResourceRoot() const { return !isNull() && GetResourceRoot() == *this; }
@@ -90,6 +108,9 @@ void JDFResource::setPartIDKeys(const vWString& keys) {
 }
 
 void JDFResource::AddPartIDKey(int partIDKey) {
+    // Every partition added asks for its key, which the root lists from the first one on.
+    if (!isNull() && listsToken(partitionRoot(node_).attribute("PartIDKeys").value(), Tables::Token(Tables::PartIDKey, partIDKey)))
+        return;
     vWString keys = GetPartIDKeys();
     keys.AppendUnique(Tables::Token(Tables::PartIDKey, partIDKey));
     setPartIDKeys(keys);
