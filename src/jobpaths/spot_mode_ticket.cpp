@@ -44,11 +44,11 @@ void writePasses(LD_JDF& w, JDF::JDFNode& root, bool marks, int passes) {
     JDF::JDFRunList runList = need(root.AppendMatchingResource(L"RunList", marks ? 9 : 10));
     runList.SetStatus(LD_RESOURCE_AVAILABLE);
     const int32_t n = static_cast<int32_t>(w.m_OrdinalTable.size());
-    writeRunPartitions(runList, passes * n, PartitionWriting::Deferred, [&w, marks, n](JDF::JDFRunList& parent, int32_t i) {
+    LD_OrdinalTableElement* first = rowOf(w, 0);
+    writeRunPartitions(runList, passes * n, PartitionWriting::Deferred, [&w, marks, n, first](JDF::JDFRunList& parent, int32_t i) {
         const int pass = i / n;
         LD_OrdinalTableElement* row = rowOf(w, i % n);
         if (!row) throw WriteFailure{};
-        LD_OrdinalTableElement* first = rowOf(w, 0);
         LD_Run* run = nullptr;
         int32_t page = -1;
         if (marks) {

@@ -7,6 +7,7 @@
 
 #include "platform/jdf/enum_tables.h"
 #include "platform/jdf/resource_scope.h"
+#include "platform/os/text.h"
 
 namespace JDF {
 
@@ -75,17 +76,15 @@ pugi::xml_node partitionRoot(pugi::xml_node n) {
     return n;
 }
 
-// Whether a whitespace-separated list holds key (keys are ASCII tokens; any other never matches).
+// Whether a whitespace-separated list holds key.
 bool listsToken(const char* list, const WString& key) {
-    for (const char* p = list; *p;) {
-        while (*p == ' ' || *p == '\t' || *p == '\n' || *p == '\r') ++p;
-        size_t i = 0;
-        while (i < key.size() && p[i] && static_cast<unsigned char>(p[i]) == static_cast<unsigned>(key[i])) ++i;
-        if (i == key.size() && (p[i] == '\0' || p[i] == ' ' || p[i] == '\t' || p[i] == '\n' || p[i] == '\r'))
-            return true;
-        while (*p && *p != ' ' && *p != '\t' && *p != '\n' && *p != '\r') ++p;
-    }
-    return false;
+    const std::string wanted = key.getUTF8();
+    bool found = false;
+    vorlan::os::forEachListItem<char>(list, " \t\r\n", [&](std::string_view item) {
+        found = item == wanted;
+        return !found;
+    });
+    return found;
 }
 
 }  // namespace

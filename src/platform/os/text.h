@@ -48,10 +48,9 @@ private:
 
 // The one list splitter: the items of text between any of the separator characters, each without
 // the spaces around it. Runs of separators give no item; an item of spaces alone gives an empty one.
-template <typename Char>
-std::vector<std::basic_string<Char>> splitList(std::basic_string_view<Char> text,
-                                               std::basic_string_view<Char> separators) {
-    std::vector<std::basic_string<Char>> items;
+// forEachListItem hands each item to visit as a view into text, until visit returns false.
+template <typename Char, typename Visit>
+void forEachListItem(std::basic_string_view<Char> text, std::basic_string_view<Char> separators, Visit visit) {
     size_t start = 0;
     while (start < text.size()) {
         size_t end = text.find_first_of(separators, start);
@@ -60,10 +59,20 @@ std::vector<std::basic_string<Char>> splitList(std::basic_string_view<Char> text
             std::basic_string_view<Char> item = text.substr(start, end - start);
             while (!item.empty() && item.front() == Char(' ')) item.remove_prefix(1);
             while (!item.empty() && item.back() == Char(' ')) item.remove_suffix(1);
-            items.emplace_back(item);
+            if (!visit(item)) return;
         }
         start = end + 1;
     }
+}
+
+template <typename Char>
+std::vector<std::basic_string<Char>> splitList(std::basic_string_view<Char> text,
+                                               std::basic_string_view<Char> separators) {
+    std::vector<std::basic_string<Char>> items;
+    forEachListItem(text, separators, [&](std::basic_string_view<Char> item) {
+        items.emplace_back(item);
+        return true;
+    });
     return items;
 }
 
